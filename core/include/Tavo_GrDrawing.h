@@ -1,0 +1,123 @@
+// Tavo_GrDrawing: a drawing of the graphics core, and how it is drawn.
+// Tavo_GrLayer:   a named group of a drawing's items, drawn in order.
+// Tavo_GrCall:    an item that places another drawing at an offset.
+//
+// A drawing holds items of these kinds, each with its attribute (Tavo_GrAttr):
+// dot, line, polyline, polygon, rectangle, circle, triangle, text at a point,
+// text wrapped in a box, and calls. Items belong to layers; layers are drawn in
+// the order they were made, the items of a layer in the order they were added.
+// Drawings are made with Tavo_GrDrawingBuilder.
+//
+// Draw(surface, mapping, clip) calls the surface as Tavo_GrSurface.h describes.
+// Item coordinates are turned into device coordinates by the mapping's
+// transform (a circle's radius and a text box's font height are scaled and
+// rounded); only items whose world bounds meet the clip are visited. The clip is
+// the device rectangle given (or the whole device window when none is given;
+// everything when the device window is empty too), widened by kClipMarginPixels
+// on every side for the pixels a surface may draw beyond an item's exact
+// extent, and inverted through the transform. A spatial index, built once per
+// layer at the first Draw after items were added, finds those items, so a pass
+// over a small part of a large drawing costs in proportion to what it visits.
+// After the first pass over a drawing, a pass allocates no memory.
+//
+// World bounds of an item: its points (a circle: centre +- radius; a text at a
+// point: a box of length x charHeight by charHeight on each side of the point's
+// baseline, placed by the horizontal alignment; a text box: the box; a call: the
+// called drawing's bounds at the call's offset, as they were when the call was
+// added).
+//
+// A drawing is not thread-safe: draw it from one thread at a time.
+#pragma once
+
+#include "Tavo_CoreApi.h"
+#include "Tavo_GrAttr.h"
+#include "Tavo_GrTypes.h"
+
+#include <memory>
+
+class Tavo_GrMapping;
+class Tavo_GrSurface;
+class Tavo_GrDrawing;
+struct Tavo_GrDrawingData;
+struct Tavo_GrLayerData;
+
+class TAVO_CORE_API Tavo_GrCall {
+public:
+    enum Kind {
+        Plain = 0,    // drawn through Tavo_GrSurface::DrawCall
+        EH = 1,       // a call that carries an event handler: DrawEHCall
+        EHSignal = 2, // a call that signals its event handler: DrawEHSignalCall
+    };
+
+    Tavo_GrCall() = default;
+    Tavo_GrCall(const Tavo_GrDrawing* drawing, int dx, int dy, Kind kind = Plain)
+        : m_drawing(drawing), m_dx(dx), m_dy(dy), m_kind(kind)
+    {
+    }
+
+    const Tavo_GrDrawing* GetDrawing() const { return m_drawing; } // not owned
+    int GetDx() const { return m_dx; }
+    int GetDy() const { return m_dy; }
+    Kind GetKind() const { return m_kind; }
+
+private:
+    const Tavo_GrDrawing* m_drawing = nullptr;
+    int m_dx = 0;
+    int m_dy = 0;
+    Kind m_kind = Plain;
+};
+
+class TAVO_CORE_API Tavo_GrLayer {
+public:
+    ~Tavo_GrLayer();
+    Tavo_GrLayer(const Tavo_GrLayer&) = delete;
+    Tavo_GrLayer& operator=(const Tavo_GrLayer&) = delete;
+
+    const char* GetName() const;
+    int GetIndex() const;
+    bool IsVisible() const;
+    int GetItemCount() const;
+
+private:
+    friend class Tavo_GrDrawing;
+    friend class Tavo_GrDrawingBuilder;
+    explicit Tavo_GrLayer(std::unique_ptr<Tavo_GrLayerData> data);
+
+    std::unique_ptr<Tavo_GrLayerData> m_data;
+};
+
+class TAVO_CORE_API Tavo_GrDrawing {
+public:
+    static constexpr int kClipMarginPixels = 4;
+
+    Tavo_GrDrawing();
+    ~Tavo_GrDrawing();
+    Tavo_GrDrawing(const Tavo_GrDrawing&) = delete;
+    Tavo_GrDrawing& operator=(const Tavo_GrDrawing&) = delete;
+
+    // Draws the items that meet clip (device coordinates, y up; null: the
+    // device window) onto the surface through the mapping's transform.
+    void Draw(Tavo_GrSurface& surface, const Tavo_GrMapping& mapping, const Tavo_GrDRect* clip) const;
+
+    // The world extent of all items; all zero for an empty drawing.
+    Tavo_GrWRect GetBounds() const;
+    void FetchBounds(Tavo_GrWRect& bounds) const;
+    bool IsEmpty() const;
+
+    int GetItemCount() const;
+    int GetLayerCount() const;
+    // Null for an index outside 0 ... GetLayerCount() - 1.
+    const Tavo_GrLayer* GetLayer(int index) const;
+    void SetLayerVisible(int index, bool visible);
+
+private:
+    friend class Tavo_GrDrawingBuilder;
+    friend class Tavo_GrSurface;
+
+    // Visits the items that meet the surface's world clip, layer by layer
+    // (BeginLayer/EndLayer only when withLayers is set); returns false once the
+    // pass is interrupted.
+    bool DrawItems(Tavo_GrSurface& surface, bool withLayers) const;
+
+    std::unique_ptr<Tavo_GrDrawingData> m_data;
+};

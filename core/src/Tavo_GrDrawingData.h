@@ -1,0 +1,68 @@
+// The storage of a drawing and of its layers, shared by Tavo_GrDrawing (which
+// draws it) and Tavo_GrDrawingBuilder (which fills it). Not part of the
+// core's interface.
+//
+// An item is 16 bytes: its kind, its attribute (an index into the drawing's
+// attribute table), where its points start in the drawing's point pool and one
+// more number whose meaning depends on the kind:
+//
+//   kind       points                       count
+//   Dot        1                            -
+//   Line       2                            -
+//   Polyline   count                        number of points
+//   Polygon    count                        number of points
+//   Rect       2 (x1, y1), (x2, y2)         -
+//   Circle     1 centre                     radius in world units
+//   Triangle   3                            -
+//   Text       1 anchor                     offset of the text in the text pool
+//   TextBox    2 corners of the box         offset of the text in the text pool
+//   Call       -                            index in the call table
+#pragma once
+
+#include "Tavo_GrAttr.h"
+#include "Tavo_GrDrawing.h"
+#include "Tavo_GrSpatialIndex.h"
+#include "Tavo_GrTypes.h"
+
+#include <cstdint>
+#include <memory>
+#include <string>
+#include <vector>
+
+enum class Tavo_GrItemKind : uint8_t { Dot, Line, Polyline, Polygon, Rect, Circle, Triangle, Text, TextBox, Call };
+
+struct Tavo_GrItem {
+    Tavo_GrItemKind kind = Tavo_GrItemKind::Dot;
+    uint32_t attr = 0;
+    uint32_t points = 0;
+    int32_t count = 0;
+};
+
+struct Tavo_GrLayerData {
+    std::string name;
+    int index = 0;
+    bool visible = true;
+    std::vector<Tavo_GrItem> items;
+    std::vector<Tavo_GrWRect> bounds; // one per item
+
+    // Built at the first Draw after items were added (cleared by adding).
+    Tavo_GrSpatialIndex spatialIndex;
+    // The items a pass visits, kept between passes so that passes do not
+    // allocate; busy while a pass walks them (a drawing that calls itself
+    // uses a storage of its own for the inner pass).
+    std::vector<uint32_t> hits;
+    bool hitsBusy = false;
+};
+
+struct Tavo_GrDrawingData {
+    std::vector<std::unique_ptr<Tavo_GrLayer>> layers;
+    std::vector<Tavo_GrAttr> attrs;
+    std::vector<Tavo_GrWPoint> points;
+    std::vector<char> texts; // zero-terminated texts, one after the other
+    std::vector<Tavo_GrCall> calls;
+    Tavo_GrWRect bounds;
+    int itemCount = 0;
+
+    // Device points of the polyline or polygon being drawn.
+    std::vector<Tavo_GrDPoint> devicePoints;
+};
