@@ -1,0 +1,83 @@
+// Gui_Msg and Gui_Locale: string-table lookup through registered modules and
+// the replacement of %1 ... %n.
+#include "Gui_Locale.h"
+#include "Gui_Msg.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace {
+
+HINSTANCE ThisProgram()
+{
+    return GetModuleHandleA(nullptr);
+}
+
+std::string Text(const CString& value)
+{
+    return std::string(value.GetString(), value.GetLength());
+}
+
+TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimal)
+{
+    EXPECT_EQ(Text((Gui_Msg(100, ThisProgram()) << 3 << -12).GetValue()), "Value 3 of -12");
+}
+
+TEST(MessageText, PercentSignsWithoutAnArgumentStayAsTheyAre)
+{
+    EXPECT_EQ(Text((Gui_Msg(101, ThisProgram()) << 7).GetValue()), "100% sure, %3 stays, 77");
+}
+
+TEST(MessageText, TwoDigitsNameArgumentsTenAndAbove)
+{
+    Gui_Msg message(102, ThisProgram());
+    for (int i = 1; i <= 12; ++i)
+        message << i * 10;
+    EXPECT_EQ(Text(message.GetValue()), "120 and 10");
+}
+
+TEST(MessageText, ArgumentTextIsNeverFormattedAgain)
+{
+    EXPECT_EQ(Gui_Msg::Substitute("%1%2", {"%2", "%s%n"}), "%2%s%n");
+    EXPECT_EQ(Gui_Msg::Substitute("50%", {}), "50%");
+    EXPECT_EQ(Gui_Msg::Substitute("%0 %a %%1", {"x"}), "%0 %a %1");
+}
+
+TEST(MessageText, StringsOfLaterBlocksAreFound)
+{
+    std::string text;
+    ASSERT_TRUE(Gui_Msg::LoadText(117, ThisProgram(), text));
+    EXPECT_EQ(text, "block two");
+}
+
+TEST(MessageText, AMissingStringGivesTheEmptyText)
+{
+    std::string text;
+    EXPECT_FALSE(Gui_Msg::LoadText(103, ThisProgram(), text));
+    EXPECT_FALSE(Gui_Msg::LoadText(100, nullptr, text)) << "nothing registered yet";
+    EXPECT_TRUE(Gui_Msg(4000, ThisProgram()).GetValue().IsEmpty());
+}
+
+TEST(MessageLookup, RegisteredModulesAreSearchedWhenNoModuleIsGiven)
+{
+    AFX_EXTENSION_MODULE record = {};
+    const int before = Gui_Locale::GetResourceModuleCount();
+    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), nullptr);
+    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), nullptr);
+    EXPECT_EQ(Gui_Locale::GetResourceModuleCount(), before + 1) << "a module is listed once";
+    EXPECT_EQ(Gui_Locale::GetResourceModule(before), ThisProgram());
+    EXPECT_EQ(record.hResource, ThisProgram());
+    EXPECT_EQ(Text((Gui_Msg(100) << 1 << 2).GetValue()), "Value 1 of 2");
+    EXPECT_EQ(Gui_Locale::GetResourceModule(-1), nullptr);
+}
+
+TEST(MessageLookup, AResourceLibraryThatCannotBeLoadedFallsBackToTheInstance)
+{
+    AFX_EXTENSION_MODULE record = {};
+    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), "no-such-library.dll");
+    EXPECT_EQ(record.hResource, ThisProgram());
+}
+
+} // namespace

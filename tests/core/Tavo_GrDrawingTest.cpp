@@ -1,0 +1,383 @@
+// Drawing a drawing: the order of calls, the base state the surface sees, item
+// conversion, calls of other drawings, culling through the spatial index and
+// interruption.
+#include "RecordingSurface.h"
+
+#include "Tavo_GrDrawing.h"
+#include "Tavo_GrDrawingBuilder.h"
+#include "Tavo_GrMapping.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+#include <utility>
+
+namespace {
+
+using Ops = std::vector<std::string>;
+
+const Tavo_GrAttr kRedFilled(4, 1, 10);
+const Tavo_GrAttr kBlueHollow(1, 0, 10);
+
+// A mapping at 1 device pixel per world unit, world origin at device (0, 0),
+// in a 1000 x 1000 window.
+Tavo_GrMapping UnitMapping(const Tavo_GrDrawing& drawing)
+{
+    Tavo_GrMapping mapping(&drawing, 5);
+    mapping.SetDeviceWindowSize(1000, 1000, true, nullptr);
+    mapping.SetWorldClipBox({0, 0, 1000, 1000});
+    return mapping;
+}
+
+TEST(DrawingPass, CallsTheSurfaceLayerByLayerThenFlushesAndEnds)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.BeginLayer("shapes");
+    build.AddRect(10, 10, 20, 20);
+    build.BeginLayer("marks");
+    build.AddDot(5, 5);
+    build.UseLayer(0);
+    build.AddLine(0, 0, 30, 30);
+
+    RecordingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    EXPECT_EQ(surface.Ops(), (Ops{"BeginDrawing", "BeginLayer", "Rect", "Line", "EndLayer", "BeginLayer", "Dot",
+                                  "EndLayer", "Flush", "EndDrawing"}));
+}
+
+TEST(DrawingPass, HiddenLayersAreNotVisited)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.BeginLayer("hidden");
+    build.AddDot(1, 1);
+    build.BeginLayer("shown");
+    build.AddDot(2, 2);
+    drawing.SetLayerVisible(0, false);
+
+    RecordingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    EXPECT_EQ(surface.Ops(), (Ops{"BeginDrawing", "BeginLayer", "Dot", "EndLayer", "Flush", "EndDrawing"}));
+    EXPECT_FALSE(drawing.GetLayer(0)->IsVisible());
+    EXPECT_STREQ(drawing.GetLayer(1)->GetName(), "shown");
+}
+
+TEST(DrawingPass, SurfaceSeesTheScaleDeviceHeightAndHollowFlagOfEachItem)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.SetAttr(kRedFilled);
+    build.AddRect(0, 0, 100, 50);
+    build.SetAttr(kBlueHollow);
+    build.AddRect(0, 0, 100, 50);
+
+    Tavo_GrMapping mapping(&drawing, 5);
+    mapping.SetDeviceWindowSize(200, 300, true, nullptr);
+    RecordingSurface surface;
+    drawing.Draw(surface, mapping, nullptr);
+
+    ASSERT_EQ(surface.Count("Rect"), 2);
+    const RecordingSurface::Call& filled = surface.m_calls[2];
+    const RecordingSurface::Call& hollow = surface.m_calls[3];
+    EXPECT_EQ(filled.scale, mapping.GetTransform().GetScale());
+    EXPECT_EQ(filled.deviceHeight, 300);
+    EXPECT_EQ(filled.color, 4);
+    EXPECT_FALSE(filled.hollow);
+    EXPECT_EQ(hollow.color, 1);
+    EXPECT_TRUE(hollow.hollow);
+}
+
+TEST(DrawingPass, AttributeChangesReachTheSurfaceOnlyWhenTheAttributeDiffers)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.SetAttr(kRedFilled);
+    build.AddDot(1, 1);
+    build.AddDot(2, 2);
+    build.SetAttr(kBlueHollow);
+    build.AddDot(3, 3);
+    build.SetAttr(kRedFilled);
+    build.AddDot(4, 4);
+
+    RecordingSurface surface;
+    const Tavo_GrMapping mapping = UnitMapping(drawing);
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(surface.m_attrChanges, 3);
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(surface.m_attrChanges, 6) << "the first attribute of every pass counts as a change";
+}
+
+TEST(DrawingPass, ItemsAreConvertedThroughTheTransform)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.SetAttr(Tavo_GrAttr(0, 1, 7));
+    build.AddCircle(10, 20, 5);
+    build.AddRect(30, 40, 10, 20);
+    const Tavo_GrWPoint line[3] = {{0, 0}, {10, 0}, {10, 10}};
+    build.AddPolyline(3, line);
+    build.AddTriangle({0, 0}, {4, 0}, {0, 4});
+    build.AddText(50, 60, "label");
+    build.AddTextBox({0, 0, 40, 20}, "boxed");
+
+    // 2 pixels per world unit, world origin at device (0, 0).
+    Tavo_GrMapping mapping(&drawing, 1);
+    mapping.SetDeviceWindowSize(200, 200, true, nullptr);
+    mapping.SetWorldClipBox({0, 0, 100, 100});
+
+    RecordingSurface surface;
+    drawing.Draw(surface, mapping, nullptr);
+    const auto& calls = surface.m_calls;
+    ASSERT_EQ(calls.size(), 11u);
+    EXPECT_EQ(calls[2].op, "Circle");
+    EXPECT_EQ(calls[2].points[0], (Tavo_GrDPoint{20, 40}));
+    EXPECT_EQ(calls[2].number, 10);
+    EXPECT_EQ(calls[3].op, "Rect");
+    EXPECT_EQ(calls[3].points, (std::vector<Tavo_GrDPoint>{{20, 40}, {60, 80}}));
+    EXPECT_EQ(calls[4].op, "Pline");
+    EXPECT_EQ(calls[4].points, (std::vector<Tavo_GrDPoint>{{0, 0}, {20, 0}, {20, 20}}));
+    EXPECT_EQ(calls[5].op, "Triangle");
+    EXPECT_EQ(calls[5].points[1], (Tavo_GrDPoint{8, 0}));
+    EXPECT_EQ(calls[6].op, "Text");
+    EXPECT_EQ(calls[6].text, "label");
+    EXPECT_EQ(calls[6].points[0], (Tavo_GrDPoint{100, 120}));
+    EXPECT_EQ(calls[7].op, "TextBox");
+    EXPECT_EQ(calls[7].text, "boxed");
+    EXPECT_EQ(calls[7].number, 14) << "font height: character height 7 at 2 pixels per unit";
+}
+
+TEST(DrawingModel, BoundsCoverEveryItem)
+{
+    Tavo_GrDrawing drawing;
+    EXPECT_TRUE(drawing.IsEmpty());
+    EXPECT_EQ(drawing.GetBounds(), (Tavo_GrWRect{}));
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddDot(10, 10);
+    build.AddCircle(100, 0, 20);
+    build.SetAttr(Tavo_GrAttr(0, 0, 10, Tavo_GrAttr::AlignRight | Tavo_GrAttr::AlignBottom));
+    build.AddText(0, 50, "abc"); // 30 units to the left of its point
+    Tavo_GrWRect bounds;
+    drawing.FetchBounds(bounds);
+    EXPECT_EQ(bounds, (Tavo_GrWRect{-30, -20, 120, 60}));
+    EXPECT_EQ(drawing.GetItemCount(), 3);
+}
+
+TEST(DrawingModel, InvalidItemsAreRefused)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    const Tavo_GrWPoint two[2] = {{0, 0}, {1, 1}};
+    EXPECT_FALSE(build.AddPolyline(1, two));
+    EXPECT_FALSE(build.AddPolyline(2, nullptr));
+    EXPECT_FALSE(build.AddPolygon(2, two));
+    EXPECT_FALSE(build.AddCall(nullptr, 0, 0));
+    EXPECT_FALSE(build.AddCall(&drawing, 0, 0));
+    EXPECT_TRUE(build.AddText(0, 0, nullptr));
+    EXPECT_EQ(drawing.GetItemCount(), 1);
+}
+
+// ---- Calls ------------------------------------------------------------------
+
+TEST(DrawingCalls, ACalledDrawingIsDrawnAtItsOffset)
+{
+    Tavo_GrDrawing symbol;
+    Tavo_GrDrawingBuilder(symbol).AddDot(0, 0);
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddCall(&symbol, 100, 50);
+    build.AddCall(&symbol, 300, 70);
+    build.AddDot(1, 1);
+
+    RecordingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    ASSERT_EQ(surface.Count("Dot"), 3);
+    EXPECT_EQ(surface.m_calls[2].points[0], (Tavo_GrDPoint{100, 50}));
+    EXPECT_EQ(surface.m_calls[3].points[0], (Tavo_GrDPoint{300, 70}));
+    EXPECT_EQ(surface.m_calls[4].points[0], (Tavo_GrDPoint{1, 1})) << "the caller's transform is back";
+}
+
+TEST(DrawingCalls, CallKindsReachTheirOwnSlots)
+{
+    struct CallCountingSurface : RecordingSurface {
+        int eh = 0;
+        int signal = 0;
+        void DrawEHCall(const Tavo_GrCall* call) override
+        {
+            ++eh;
+            RecordingSurface::DrawEHCall(call);
+        }
+        void DrawEHSignalCall(const Tavo_GrCall*) override { ++signal; }
+    };
+    Tavo_GrDrawing symbol;
+    Tavo_GrDrawingBuilder(symbol).AddDot(0, 0);
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddCall(&symbol, 0, 0, Tavo_GrCall::EH);
+    build.AddCall(&symbol, 0, 0, Tavo_GrCall::EHSignal);
+
+    CallCountingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    EXPECT_EQ(surface.eh, 1);
+    EXPECT_EQ(surface.signal, 1);
+    EXPECT_EQ(surface.Count("Dot"), 1) << "the base EH call draws like a plain call";
+}
+
+TEST(DrawingCalls, CyclesOfCallsAreRefused)
+{
+    Tavo_GrDrawing a;
+    Tavo_GrDrawing b;
+    Tavo_GrDrawing c;
+    EXPECT_TRUE(Tavo_GrDrawingBuilder(a).AddCall(&b, 0, 0));
+    EXPECT_TRUE(Tavo_GrDrawingBuilder(b).AddCall(&c, 0, 0));
+    EXPECT_FALSE(Tavo_GrDrawingBuilder(c).AddCall(&a, 0, 0));
+}
+
+TEST(DrawingCalls, OnlyThePartOfACalledDrawingInsideTheClipIsDrawn)
+{
+    Tavo_GrDrawing symbol;
+    Tavo_GrDrawingBuilder symbolBuild(symbol);
+    symbolBuild.AddDot(0, 0);
+    symbolBuild.AddDot(500, 0);
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder(drawing).AddCall(&symbol, 100, 100);
+
+    RecordingSurface surface;
+    const Tavo_GrDRect clip{90, 90, 110, 110};
+    drawing.Draw(surface, UnitMapping(drawing), &clip);
+    ASSERT_EQ(surface.Count("Dot"), 1);
+    EXPECT_EQ(surface.m_calls[2].points[0], (Tavo_GrDPoint{100, 100}));
+}
+
+// ---- Culling ------------------------------------------------------------------
+
+TEST(DrawingCulling, AMillionItemsThroughASmallClipReachTheSurfaceAsOnlyTheItemsItMeets)
+{
+    constexpr int kSide = 1000;
+    constexpr int kSpacing = 10;
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.Reserve(kSide * kSide, kSide * kSide);
+    for (int i = 0; i < kSide; ++i)
+        for (int j = 0; j < kSide; ++j)
+            build.AddDot(i * kSpacing, j * kSpacing);
+    ASSERT_EQ(drawing.GetItemCount(), kSide * kSide);
+
+    const Tavo_GrMapping mapping = UnitMapping(drawing);
+    const Tavo_GrDRect clip{100, 200, 149, 249};
+    RecordingSurface surface;
+    drawing.Draw(surface, mapping, &clip);
+
+    // At one pixel per unit the clip, widened by the margin, is the world area.
+    const int m = Tavo_GrDrawing::kClipMarginPixels;
+    std::vector<Tavo_GrDPoint> expected;
+    for (int i = 0; i < kSide; ++i)
+        for (int j = 0; j < kSide; ++j) {
+            const int x = i * kSpacing;
+            const int y = j * kSpacing;
+            if (x >= clip.xmin - m && x <= clip.xmax + m && y >= clip.ymin - m && y <= clip.ymax + m)
+                expected.push_back({x, y});
+        }
+    std::vector<Tavo_GrDPoint> drawn;
+    for (const RecordingSurface::Call& call : surface.m_calls)
+        if (call.op == "Dot")
+            drawn.push_back(call.points[0]);
+    EXPECT_EQ(surface.m_items, static_cast<int>(expected.size()));
+    EXPECT_EQ(drawn, expected) << "exactly the items the clip meets, in the order they were added";
+    EXPECT_EQ(expected.size(), 36u);
+
+    // Another part of the same drawing, through the index already built.
+    const Tavo_GrDRect corner{0, 0, 5, 5};
+    RecordingSurface second;
+    drawing.Draw(second, mapping, &corner);
+    EXPECT_EQ(second.m_items, 1);
+}
+
+TEST(DrawingCulling, WithoutAClipTheDeviceWindowIsTheClip)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddDot(500, 500);
+    build.AddDot(1003, 500); // within the margin
+    build.AddDot(1100, 500);
+    build.AddRect(-100, -100, 2000, 2000); // covers the window
+
+    RecordingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    EXPECT_EQ(surface.Count("Dot"), 2);
+    EXPECT_EQ(surface.Count("Rect"), 1);
+}
+
+TEST(DrawingCulling, AMappingWithoutAWindowDrawsEverything)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddDot(-100000, 0);
+    build.AddDot(100000, 0);
+    Tavo_GrMapping mapping(&drawing, 5);
+    RecordingSurface surface;
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(surface.Count("Dot"), 2);
+}
+
+TEST(DrawingCulling, ItemsAddedAfterAPassAreFound)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    build.AddDot(10, 10);
+    const Tavo_GrMapping mapping = UnitMapping(drawing);
+    const Tavo_GrDRect clip{0, 0, 100, 100};
+    RecordingSurface first;
+    drawing.Draw(first, mapping, &clip);
+    build.AddDot(20, 20);
+    RecordingSurface second;
+    drawing.Draw(second, mapping, &clip);
+    EXPECT_EQ(second.Count("Dot"), 2);
+}
+
+// ---- Interruption ---------------------------------------------------------------
+
+TEST(DrawingInterrupt, AnInterruptStopsThePassButStillFlushesAndEnds)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    for (int i = 0; i < 10000; ++i)
+        build.AddDot(i % 1000, i / 1000);
+
+    RecordingSurface surface;
+    surface.m_record = false;
+    surface.m_interruptAtPoll = 2;
+    const Tavo_GrMapping mapping = UnitMapping(drawing);
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(surface.m_items, 2 * Tavo_GrSurface::kPollInterval);
+    EXPECT_EQ(surface.Ops(), (Ops{"BeginDrawing", "BeginLayer", "EndLayer", "Flush", "EndDrawing"}));
+    EXPECT_TRUE(surface.IsDrawingInterrupted());
+
+    // The next pass starts with the flag cleared.
+    surface.m_interruptAtPoll = 0;
+    surface.m_items = 0;
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(surface.m_items, 10000);
+    EXPECT_FALSE(surface.IsDrawingInterrupted());
+}
+
+TEST(DrawingInterrupt, AFlagSetByTheSurfaceStopsThePassAtTheNextItem)
+{
+    struct StopAfterThird : RecordingSurface {
+        void DrawDot(Tavo_GrDPoint& p, Tavo_GrAttr* attr) override
+        {
+            RecordingSurface::DrawDot(p, attr);
+            if (m_items == 3)
+                SetDrawingInterruptedFlag();
+        }
+    };
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    for (int i = 0; i < 10; ++i)
+        build.AddDot(i, 0);
+    StopAfterThird surface;
+    drawing.Draw(surface, UnitMapping(drawing), nullptr);
+    EXPECT_EQ(surface.m_items, 3);
+}
+
+} // namespace
