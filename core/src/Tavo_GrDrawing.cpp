@@ -12,6 +12,10 @@
 
 namespace {
 
+// A pass that visits more than one item in this many marks them instead of
+// sorting their numbers.
+constexpr size_t kMarkingShare = 16;
+
 int SaturatedAdd(int value, int delta)
 {
     const long long sum = static_cast<long long>(value) + delta;
@@ -191,6 +195,74 @@ void DrawItem(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, const Tavo_GrIt
 
 } // namespace
 
+namespace {
+
+bool Contains(const Tavo_GrWRect& outer, const Tavo_GrWRect& inner)
+{
+    return outer.x1 <= inner.x1 && outer.y1 <= inner.y1 && inner.x2 <= outer.x2 && inner.y2 <= outer.y2;
+}
+
+// Every item of the layer, in order. Returns false once the pass is interrupted.
+template <typename KeepGoing>
+bool DrawAllItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, const Tavo_GrLayerData& layer, KeepGoing keepGoing)
+{
+    for (const Tavo_GrItem& item : layer.items) {
+        DrawItem(surface, data, item);
+        if (!keepGoing())
+            return false;
+    }
+    return true;
+}
+
+// The items of the layer that meet the surface's world clip, in order, found
+// through the spatial index. Returns false once the pass is interrupted.
+template <typename KeepGoing>
+bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_GrLayerData& layer, KeepGoing keepGoing,
+                      const Tavo_GrWRect& clip)
+{
+    if (!layer.spatialIndex.IsBuilt())
+        layer.spatialIndex.Build(layer.bounds);
+
+    // A drawing that calls itself meets its own busy lists: the inner pass then
+    // uses lists of its own.
+    std::vector<uint32_t> ownHits;
+    std::vector<uint8_t> ownMarks;
+    const bool claimed = !layer.hitsBusy;
+    std::vector<uint32_t>& hits = claimed ? layer.hits : ownHits;
+    std::vector<uint8_t>& marks = claimed ? layer.marks : ownMarks;
+    layer.hitsBusy = true;
+
+    hits.clear();
+    layer.spatialIndex.Query(clip, layer.bounds, hits);
+    bool going = true;
+    if (hits.size() * kMarkingShare < layer.items.size()) {
+        std::sort(hits.begin(), hits.end());
+        for (size_t i = 0; i < hits.size() && going; ++i) {
+            DrawItem(surface, data, layer.items[hits[i]]);
+            going = keepGoing();
+        }
+    } else {
+        // Many items: marking them and walking the layer costs less than sorting.
+        marks.resize(layer.items.size());
+        for (uint32_t item : hits)
+            marks[item] = 1;
+        for (size_t i = 0; i < marks.size(); ++i) {
+            if (!marks[i])
+                continue;
+            marks[i] = 0;
+            if (going) {
+                DrawItem(surface, data, layer.items[i]);
+                going = keepGoing();
+            }
+        }
+    }
+    if (claimed)
+        layer.hitsBusy = false;
+    return going;
+}
+
+} // namespace
+
 bool Tavo_GrDrawing::DrawItems(Tavo_GrSurface& surface, bool withLayers) const
 {
     Tavo_GrDrawingData& data = *m_data;
@@ -212,32 +284,9 @@ bool Tavo_GrDrawing::DrawItems(Tavo_GrSurface& surface, bool withLayers) const
         if (withLayers)
             surface.BeginLayer(layerObject.get());
 
-        bool going = true;
-        if (!surface.m_hasWorldClip) {
-            for (size_t i = 0; i < layer.items.size() && going; ++i) {
-                DrawItem(surface, data, layer.items[i]);
-                going = keepGoing();
-            }
-        } else {
-            if (!layer.spatialIndex.IsBuilt())
-                layer.spatialIndex.Build(layer.bounds);
-            // A drawing that calls itself meets its own busy list: the inner
-            // pass then uses a list of its own.
-            std::vector<uint32_t> ownHits;
-            std::vector<uint32_t>& hits = layer.hitsBusy ? ownHits : layer.hits;
-            const bool claimed = !layer.hitsBusy;
-            layer.hitsBusy = true;
-            hits.clear();
-            layer.spatialIndex.Query(surface.m_worldClip, layer.bounds, hits);
-            std::sort(hits.begin(), hits.end());
-            for (size_t i = 0; i < hits.size() && going; ++i) {
-                DrawItem(surface, data, layer.items[hits[i]]);
-                going = keepGoing();
-            }
-            if (claimed)
-                layer.hitsBusy = false;
-        }
-
+        const bool going = surface.m_hasWorldClip && !Contains(surface.m_worldClip, layer.extent)
+            ? DrawVisibleItems(surface, data, layer, keepGoing, surface.m_worldClip)
+            : DrawAllItems(surface, data, layer, keepGoing);
         if (withLayers)
             surface.EndLayer();
         if (!going)

@@ -98,6 +98,9 @@ bool Tavo_GrDrawingBuilder::AddItem(int kind, const Tavo_GrWPoint* points, int p
     item.points = static_cast<uint32_t>(data.points.size());
     item.count = count;
     data.points.insert(data.points.end(), points, points + pointCount);
+    layer.extent = layer.items.empty() ? bounds
+                                       : Tavo_GrWRect{std::min(layer.extent.x1, bounds.x1), std::min(layer.extent.y1, bounds.y1),
+                                                      std::max(layer.extent.x2, bounds.x2), std::max(layer.extent.y2, bounds.y2)};
     layer.items.push_back(item);
     layer.bounds.push_back(bounds);
     layer.spatialIndex.Clear();

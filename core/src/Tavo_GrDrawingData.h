@@ -44,6 +44,7 @@ struct Tavo_GrLayerData {
     bool visible = true;
     std::vector<Tavo_GrItem> items;
     std::vector<Tavo_GrWRect> bounds; // one per item
+    Tavo_GrWRect extent;              // of all items (valid when there are items)
 
     // Built at the first Draw after items were added (cleared by adding).
     Tavo_GrSpatialIndex spatialIndex;
@@ -51,6 +52,9 @@ struct Tavo_GrLayerData {
     // allocate; busy while a pass walks them (a drawing that calls itself
     // uses a storage of its own for the inner pass).
     std::vector<uint32_t> hits;
+    // One mark per item, all clear between passes: a pass that visits many
+    // items marks them and walks the layer in order instead of sorting.
+    std::vector<uint8_t> marks;
     bool hitsBusy = false;
 };
 

@@ -320,6 +320,25 @@ TEST(DrawingCulling, AMappingWithoutAWindowDrawsEverything)
     EXPECT_EQ(surface.Count("Dot"), 2);
 }
 
+TEST(DrawingCulling, AClipThatMeetsMostItemsStillDrawsOnlyThoseInOrder)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    // Added in an order the spatial index does not keep: right to left.
+    for (int x = 990; x >= 0; x -= 10)
+        build.AddDot(x, 500);
+    const Tavo_GrDRect clip{0, 0, 895, 1000}; // meets x 0 ... 890 (with the margin: ... 899)
+    RecordingSurface surface;
+    drawing.Draw(surface, UnitMapping(drawing), &clip);
+    ASSERT_EQ(surface.Count("Dot"), 90);
+    EXPECT_EQ(surface.m_calls[2].points[0].x, 890);
+    EXPECT_EQ(surface.m_calls[91].points[0].x, 0);
+
+    RecordingSurface again;
+    drawing.Draw(again, UnitMapping(drawing), &clip);
+    EXPECT_EQ(again.Count("Dot"), 90) << "the marks were cleared after the first pass";
+}
+
 TEST(DrawingCulling, ItemsAddedAfterAPassAreFound)
 {
     Tavo_GrDrawing drawing;
