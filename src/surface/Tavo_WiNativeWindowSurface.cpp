@@ -1,0 +1,5 @@
+#include "Tavo_WiNativeWindowSurface.h"
+
+Tavo_WiNativeWindowSurface::Tavo_WiNativeWindowSurface() = default;
+
+Tavo_WiNativeWindowSurface::~Tavo_WiNativeWindowSurface() = default;
