@@ -308,3 +308,12 @@ void PumpInput()
 }
 
 }  // namespace ScrollTest
+
+namespace ScrollTest {
+
+bool EnglishLocale()
+{
+    return (::GetUserDefaultLCID() & 0x3FF) == LANG_ENGLISH;
+}
+
+}  // namespace ScrollTest

@@ -178,3 +178,11 @@ inline void PrintTo(const CPoint& point, std::ostream* out)
 {
     *out << "(" << point.x << ", " << point.y << ")";
 }
+
+namespace ScrollTest {
+
+// Whether the library uses its own window classes in this process (the user's
+// default locale is English).
+bool EnglishLocale();
+
+}  // namespace ScrollTest

@@ -8,6 +8,9 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+#include <string>
+
 using namespace ScrollTest;
 
 namespace {
@@ -372,17 +375,63 @@ TEST_F(ScrolleeTest, ScrolleeOwnsItsMonitorAndDataTipWindows)
     EXPECT_FALSE(::IsWindow(tip));
 }
 
-TEST_F(ScrolleeTest, WindowClassDeliversDoubleClicksAndHasABlackBrush)
+std::string ClassOf(HWND hwnd)
 {
     char name[64] = {};
-    ::GetClassNameA(Scrollee(), name, sizeof name);
-    EXPECT_STREQ(name, "Tavo_WiScrollee");
+    ::GetClassNameA(hwnd, name, sizeof name);
+    return name;
+}
+
+TEST_F(ScrolleeTest, UnderEnglishTheLibrarysOwnClassesAreUsed)
+{
+    if (!EnglishLocale())
+        GTEST_SKIP() << "the user's default locale is not English";
+    EXPECT_EQ(ClassOf(Scrollee()), "Tavo_WiScrollee");
     EXPECT_EQ(::GetClassLongPtrA(Scrollee(), GCL_STYLE), static_cast<ULONG_PTR>(CS_DBLCLKS | CS_PARENTDC));
     EXPECT_EQ(reinterpret_cast<HBRUSH>(::GetClassLongPtrA(Scrollee(), GCLP_HBRBACKGROUND)),
               static_cast<HBRUSH>(::GetStockObject(BLACK_BRUSH)));
-    ::GetClassNameA(wnd.GetSafeHwnd(), name, sizeof name);
-    EXPECT_STREQ(name, "Tavo_WiScrollWnd");
-    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCL_STYLE), static_cast<ULONG_PTR>(0x88));
+    EXPECT_EQ(ClassOf(wnd.GetSafeHwnd()), "Tavo_WiScrollWnd");
+    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCL_STYLE), static_cast<ULONG_PTR>(CS_DBLCLKS | CS_PARENTDC));
+    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HBRBACKGROUND), 0u);
+    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HCURSOR), 0u);
+    const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
+    EXPECT_EQ(ClassOf(monitor), "Tavo_WiParkedCursorWnd");
+    EXPECT_EQ(::GetClassLongPtrA(monitor, GCL_STYLE), static_cast<ULONG_PTR>(CS_PARENTDC));
+    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
+    EXPECT_EQ(ClassOf(tip), "Tavo_WiDataTip");
+    EXPECT_EQ(::GetClassLongPtrA(tip, GCL_STYLE), static_cast<ULONG_PTR>(CS_SAVEBITS | CS_DBLCLKS));
+    EXPECT_NE(::GetClassLongPtrA(tip, GCLP_HBRBACKGROUND), 0u);
+    EXPECT_EQ(reinterpret_cast<HCURSOR>(::GetClassLongPtrA(tip, GCLP_HCURSOR)), ::LoadCursor(nullptr, IDC_ARROW));
+}
+
+TEST_F(ScrolleeTest, UnderAnotherLanguageTheFrameworksDefaultClassIsUsed)
+{
+    if (EnglishLocale())
+        GTEST_SKIP() << "the user's default locale is English";
+    for (HWND hwnd : {wnd.GetSafeHwnd(), Scrollee(), ::GetDlgItem(Scrollee(), 2000),
+                      wnd.GetScrollee()->GetDataTip()->GetSafeHwnd()}) {
+        ASSERT_NE(hwnd, nullptr);
+        EXPECT_EQ(ClassOf(hwnd).rfind("Tavo_Wi", 0), std::string::npos) << ClassOf(hwnd);
+    }
+    // The tip still carries its border and tool-window style.
+    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
+    EXPECT_NE(::GetWindowLongA(tip, GWL_EXSTYLE) & WS_EX_TOOLWINDOW, 0);
+    EXPECT_NE(::GetWindowLongA(tip, GWL_STYLE) & WS_BORDER, 0);
+}
+
+TEST_F(ScrolleeTest, DoubleClicksArriveUnderEitherClass)
+{
+    EXPECT_NE(::GetClassLongPtrA(Scrollee(), GCL_STYLE) & CS_DBLCLKS, 0u);
+}
+
+TEST(ScrollLocale, ProcessRunsUnderTheExpectedLanguage)
+{
+    // The suite runs once more under a German locale; that run names the
+    // language it expects, so that a locale the platform ignored is noticed.
+    const char* expected = std::getenv("SCROLL_TEST_PRIMARY_LANGUAGE");
+    if (expected == nullptr)
+        GTEST_SKIP() << "no language expected";
+    EXPECT_EQ(static_cast<int>(::GetUserDefaultLCID() & 0x3FF), std::atoi(expected));
 }
 
 }  // namespace
