@@ -13,18 +13,20 @@
 #include "Gui_Locale.h"
 #include "Port_Init.h"
 #include "Tavo_WiModule.h"
+#include "Tavo_WiParkedCursorMonitor.h"
+#include "Tavo_WiScrollStatics.h"
 
 #include <new>
 
 // ---- 1. The data tip's shared font ------------------------------------------
-// Defined here by the data tip (Tavo_WiDataTip): an empty font object that the
-// data tip attaches its font to on first use; its destructor deletes the
-// attached font, if any, at unload.
+// An empty font object that the first data tip's Create gives its font; its
+// destructor deletes that font, if any, at unload.
+CFont Tavo_WiScrollStatics::dataTipFont;
 
 // ---- 2. The data tip's shared background brush --------------------------------
-// Defined here by the data tip (Tavo_WiDataTip): a brush pointer, null at load,
-// set when the data tip first paints; an object defined right after it deletes
-// the brush, if any, at unload and sets the pointer to null.
+// Null at load; the first data tip's Create makes the brush of the tip's
+// window class. The owning pointer deletes it, if any, at unload.
+std::unique_ptr<CBrush> Tavo_WiScrollStatics::dataTipBrush;
 
 // ---- 3.-7. The portability library's services ----------------------------------
 // Holding one initialiser of each keeps those services usable while the
@@ -36,9 +38,8 @@ static FactoryInit s_factoryInit;
 static Port_MsgManInit s_msgManInit;
 
 // ---- 8. The parked-cursor notification message ----------------------------------
-// Defined here by the parked cursor monitor: a static unsigned int holding
-// Tavo_WiParkedCursorMonitor::GetNotifyMsg(), read once at load; the
-// scrollee's message map dispatches on it.
+// Read once at load; the scrollee's message map dispatches on it.
+UINT Tavo_WiScrollStatics::parkedCursorNotifyMsg = Tavo_WiParkedCursorMonitor::GetNotifyMsg();
 
 namespace {
 
