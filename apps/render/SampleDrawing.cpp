@@ -74,7 +74,7 @@ void DotsAndLines(Tavo_GrDrawingBuilder& build)
     }
     build.SetAttr(Tavo_GrAttr(Red, kHollow));
     build.AddLine(230, 470, 230, 590); // vertical
-    Label(build, 300, 586, "lines");
+    Label(build, 300, 578, "lines");
     // A zig-zag polyline and a sine wave.
     Tavo_GrWPoint zigzag[9];
     for (int i = 0; i < 9; ++i)
@@ -100,7 +100,7 @@ void Rectangles(Tavo_GrDrawingBuilder& build)
         build.SetAttr(Tavo_GrAttr(colours[i], kHollow));
         build.AddRect(x, 510, x + 44, 590);
     }
-    Label(build, 610, 600, "filled");
+    Label(build, 610, 596, "filled");
     Label(build, 610, 490, "outlined");
     // Overlapping filled rectangles: later colour runs are drawn on top.
     build.SetAttr(Tavo_GrAttr(DarkRed, kSolid));
@@ -146,8 +146,8 @@ void Triangles(Tavo_GrDrawingBuilder& build)
         build.SetAttr(Tavo_GrAttr(colours[i], kHollow));
         build.AddTriangle({x, 520}, {x + 60, 520}, {x + 30, 600});
     }
-    Label(build, 1400, 604, "filled");
-    Label(build, 1400, 500, "outlined");
+    Label(build, 1400, 596, "filled");
+    Label(build, 1400, 496, "outlined");
     // Tiny outlined triangles are drawn open.
     build.SetAttr(Tavo_GrAttr(Black, kHollow));
     for (int i = 0; i < 10; ++i)
