@@ -3,6 +3,7 @@
 #include "SurfaceFixture.h"
 
 #include "Tavo_WiLibrary.h"
+#include "Tavo_WiNativeWindowSurface.h"
 #include "Tavo_WiPalette.h"
 
 #include <algorithm>
@@ -404,6 +405,25 @@ TEST_F(RecordedSurfaceTest, StaticCountArraysComeBackAfterTheLastSurfaceDied)
         EXPECT_EQ(std::vector<DWORD>{2}, call.countValues);
     }
     EXPECT_TRUE(sawLine);
+}
+
+
+// ---- The on-screen surface ------------------------------------------------------
+
+TEST(NativeWindowSurface, DrawsAsTheGdiSurfaceDoes)
+{
+    static_assert(std::is_base_of_v<Tavo_WiWin32Surface, Tavo_WiNativeWindowSurface>);
+    DibCanvas canvas(40, 30);
+    Tavo_WiNativeWindowSurface surface;
+    surface.SetDC(canvas.GetDC());
+    surface.SetDeviceHeight(30);
+    surface.BeginDrawing(nullptr);
+    Tavo_GrAttr attr = Filled(kBlue);
+    Tavo_GrDRect r{5, 5, 14, 14};
+    surface.DrawRect(r, &attr);
+    surface.Flush();
+    surface.EndDrawing();
+    EXPECT_EQ(100, canvas.CountPixels(ColourOf(kBlue)));
 }
 
 #pragma pop_macro("DrawText")
