@@ -132,6 +132,46 @@ TEST_F(TextTest, PlaceholderFollowsTheHorizontalAlignment)
     EXPECT_EQ(10, m_canvas.CountPixels(ColourOf(kBlue), 95, kHeight - 80, 105, kHeight - 79));
 }
 
+namespace {
+
+// Rows of the canvas that hold at least one pixel of the colour.
+int RowsWith(const DibCanvas& canvas, COLORREF colour)
+{
+    int rows = 0;
+    for (int y = 0; y < canvas.GetHeight(); ++y)
+        if (canvas.CountPixels(colour, 0, y, canvas.GetWidth(), y + 1) > 0)
+            ++rows;
+    return rows;
+}
+
+} // namespace
+
+TEST_F(SurfaceTest, TextBelowTheMinimumFontIsDrawnAtTheMinimumHeight)
+{
+    // "HH": capital letters without descenders, 5 pixels asked for.
+    Tavo_GrAttr attr = Outline(kRed, 5);
+    Tavo_GrDPoint p = At(20, 60);
+    {
+        ScopedEnvironment minFont("BRY_VWR_MINFONT", "3");
+        CreateSurface();
+    }
+    m_surface->DrawText("HH", p, &attr);
+    EndPass();
+    const int rowsAtFive = RowsWith(m_canvas, ColourOf(kRed));
+
+    m_canvas.Fill(RGB(255, 255, 255));
+    {
+        ScopedEnvironment minFont("BRY_VWR_MINFONT", "16");
+        CreateSurface();
+    }
+    m_surface->DrawText("HH", p, &attr);
+    EndPass();
+    const int rowsAtSixteen = RowsWith(m_canvas, ColourOf(kRed));
+
+    EXPECT_GT(rowsAtFive, 0);
+    EXPECT_GT(rowsAtSixteen, rowsAtFive + 4) << "the letters grew to the minimum font";
+}
+
 // ---- Text in a box ----------------------------------------------------------------
 
 class BoxTextTest : public TextTest {
