@@ -36,8 +36,10 @@ public:
 
 private:
     bool Reserve(int capacity);
+    // Writes the storage address into the owner's element pointer.
+    void PublishStorage();
 
-    void** m_storagePointer; // the owner's element pointer, kept in step
+    void* m_storagePointer; // the owner's element pointer, kept in step
     char* m_storage = nullptr;
     int m_width;
     int m_count = 0;

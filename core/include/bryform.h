@@ -7,6 +7,8 @@
 
 #include "Tavo_CoreApi.h"
 
+#include <cstdio> // __MINGW_PRINTF_FORMAT: the printf dialect of the runtime
+
 constexpr int kBryformSlots = 8;
 
-TAVO_CORE_API const char* bryform(const char* format, ...) __attribute__((format(printf, 1, 2)));
+TAVO_CORE_API const char* bryform(const char* format, ...) __attribute__((format(__MINGW_PRINTF_FORMAT, 1, 2)));

@@ -6,20 +6,27 @@
 #include <cstring>
 
 UT_DARRAY::UT_DARRAY(void* storagePointer, int elementWidth, int initialCapacity, int clearNew)
-    : m_storagePointer(static_cast<void**>(storagePointer)),
+    : m_storagePointer(storagePointer),
       m_width(elementWidth > 0 ? elementWidth : 1),
       m_initialCapacity(initialCapacity > 0 ? initialCapacity : 1),
       m_clearNew(clearNew != 0)
 {
-    if (m_storagePointer)
-        *m_storagePointer = nullptr;
+    PublishStorage();
 }
 
 UT_DARRAY::~UT_DARRAY()
 {
     std::free(m_storage);
+    m_storage = nullptr;
+    PublishStorage();
+}
+
+void UT_DARRAY::PublishStorage()
+{
+    // The owner's pointer has the owner's element type; copying the bytes of
+    // the address keeps the store free of type punning.
     if (m_storagePointer)
-        *m_storagePointer = nullptr;
+        std::memcpy(m_storagePointer, &m_storage, sizeof m_storage);
 }
 
 bool UT_DARRAY::Reserve(int capacity)
@@ -35,8 +42,7 @@ bool UT_DARRAY::Reserve(int capacity)
         return false;
     m_storage = storage;
     m_capacity = grown;
-    if (m_storagePointer)
-        *m_storagePointer = m_storage;
+    PublishStorage();
     return true;
 }
 
