@@ -33,9 +33,10 @@ constexpr UINT ScrollCodes[4][4] = {
 };
 
 // The thumb position of a bar message in bar units. The message carries only
-// 16 bits of it; the bar itself knows all 32 while its thumb is tracked, so
-// that value is taken whenever it agrees with the message's 16 bits (a bar
-// range may lie anywhere in int range, only its width is limited).
+// its low 16 bits, while a bar range may lie anywhere in int range (only its
+// width is limited). While the thumb is tracked the bar itself knows all 32
+// bits; otherwise the one value of the bar's range with those low bits is
+// the position, since a bar range is narrower than 65536 units.
 int ThumbPosition(UINT n, CScrollBar* bar)
 {
     const int fromMessage = static_cast<int>(n);
@@ -43,12 +44,15 @@ int ThumbPosition(UINT n, CScrollBar* bar)
         return fromMessage;
     SCROLLINFO info = {};
     info.cbSize = sizeof info;
-    info.fMask = SIF_TRACKPOS;
+    info.fMask = SIF_RANGE | SIF_TRACKPOS;
     if (!::GetScrollInfo(bar->GetSafeHwnd(), SB_CTL, &info))
         return fromMessage;
-    if (static_cast<short>(info.nTrackPos) != static_cast<short>(n))
-        return fromMessage;
-    return info.nTrackPos;
+    if (static_cast<WORD>(info.nTrackPos) == static_cast<WORD>(n))
+        return info.nTrackPos;
+    const long long inRange = info.nMin + ((static_cast<long long>(n) - info.nMin) & 0xFFFF);
+    if (inRange <= info.nMax)
+        return static_cast<int>(inRange);
+    return fromMessage;
 }
 
 void SetBarPageSize(CScrollBar& bar, int page)

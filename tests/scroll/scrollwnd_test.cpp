@@ -3,6 +3,7 @@
 // children and the moving of pixels.
 #include "scroll_test_support.h"
 
+#include "Tavo_WiDataTip.h"
 #include "Tavo_WiScrollMath.h"
 
 #include <gtest/gtest.h>
@@ -109,6 +110,24 @@ TEST_F(ScrollWndTest, DestroyWindowTakesTheChildrenAndTheScrolleesWindowsWithIt)
     EXPECT_FALSE(::IsWindow(monitor));
     EXPECT_EQ(wnd.GetSafeHwnd(), nullptr);
     EXPECT_FALSE(wnd.DestroyWindow()) << "a second DestroyWindow finds no window";
+}
+
+TEST_F(ScrollWndTest, DestructorAloneLeavesNoWindowBehind)
+{
+    std::vector<HWND> windows;
+    {
+        RecordingScrollWnd other;
+        ASSERT_TRUE(other.Create(WS_CHILD | WS_VISIBLE, CRect(0, 0, 100, 100), host.Wnd(), 78));
+        const HWND scrollee = other.GetScrollee()->GetSafeHwnd();
+        windows = {other.GetSafeHwnd(), scrollee, ::GetDlgItem(scrollee, 2000),
+                   other.GetScrollee()->GetDataTip()->GetSafeHwnd(),
+                   ::GetDlgItem(other.GetSafeHwnd(), 1001), ::GetDlgItem(other.GetSafeHwnd(), 1002),
+                   ::GetDlgItem(other.GetSafeHwnd(), 1003)};
+        for (HWND hwnd : windows)
+            ASSERT_TRUE(::IsWindow(hwnd));
+    }
+    for (HWND hwnd : windows)
+        EXPECT_FALSE(::IsWindow(hwnd));
 }
 
 // ---- the scroll model on the bars -----------------------------------------------------
@@ -304,6 +323,51 @@ TEST_F(ScrollWndTest, ThumbOnAScaledBarMapsBackToScrollUnits)
     wnd.SetScrollPosition(CPoint(0, 0));
     SendHScroll(SB_THUMBTRACK, 1234);
     EXPECT_EQ(wnd.GetScrollPosition().x, 2468);
+}
+
+TEST_F(ScrollWndTest, ThumbMessageFindsItsPositionInABarRangeBeyondSixteenBits)
+{
+    // A bar range of -2 .. 32766 (scale 2.0) and one of 200000 .. 230000:
+    // the message carries the low 16 bits of the thumb position only.
+    wnd.SetScrollRange(-3, 65531, 200000, 230000);
+    wnd.SetScrollWindowExtent(0, 0);
+    wnd.SetScrollPosition(CPoint(1000, 200000));
+    SendHScroll(SB_THUMBTRACK, 0xFFFF & -2);
+    EXPECT_EQ(wnd.GetScrollPosition().x, -4);
+    SendVScroll(SB_THUMBTRACK, 0xFFFF & 210000);
+    EXPECT_EQ(wnd.GetScrollPosition().y, 210000);
+}
+
+TEST_F(ScrollWndTest, DraggingTheRealThumbOfAFarRangeScrolls)
+{
+    wnd.SetScrollRange(200000, 230000, 0, 100);
+    wnd.SetScrollDeltas(CSize(100, 10), CSize(10, 1));
+    wnd.SetScrollWindowExtent(3000, 10);
+    wnd.SetScrollPosition(CPoint(200000, 0));
+    wnd.SetScrollDone();
+    ASSERT_TRUE(::IsWindowVisible(HorzBar()));
+    wnd.Clear();
+
+    SCROLLBARINFO bar = {};
+    bar.cbSize = sizeof bar;
+    ASSERT_TRUE(::GetScrollBarInfo(HorzBar(), OBJID_CLIENT, &bar));
+    const POINT thumb = {bar.rcScrollBar.left + (bar.xyThumbTop + bar.xyThumbBottom) / 2,
+                         (bar.rcScrollBar.top + bar.rcScrollBar.bottom) / 2};
+    const POINT dragged = {thumb.x + 100, thumb.y};
+    const DWORD time = FreshTime();
+    // Queued at once: the bar's own tracking loop takes them all.
+    SendMouse(0, thumb, time);
+    SendMouse(MOUSEEVENTF_LEFTDOWN, thumb, time + 10);
+    SendMouse(0, dragged, time + 20);
+    SendMouse(MOUSEEVENTF_LEFTUP, dragged, time + 30);
+    PumpUntil([this] { return !wnd.CallsNamed("DragScrollEnd").empty(); });
+
+    ASSERT_EQ(wnd.CallsNamed("DragScrollStart").size(), 1u);
+    ASSERT_EQ(wnd.CallsNamed("DragScrollEnd").size(), 1u);
+    const int x = wnd.GetScrollPosition().x;
+    EXPECT_GT(x, 201000) << "the thumb moved a good part of the range";
+    EXPECT_LE(x, 230000 - 3000);
+    EXPECT_EQ(BarInfo(HorzBar()).nPos, x);
 }
 
 TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
