@@ -19,6 +19,7 @@
 #include "Tavo_GrSurfaceStats.h"
 #include "Tavo_WiPrimitiveBatch.h"
 
+#include <climits>
 #include <memory>
 
 // The graphics core names an operation DrawText; keep <windows.h>'s macro of
@@ -66,9 +67,8 @@ public:
     void EndDrawing() override;
     bool PollDrawInterrupt() override;
 
-    // ---- Implementation ---------------------------------------------------
+    // ---- Batch capacities, in elements --------------------------------------
 
-    // Batch capacities, in elements.
     static constexpr int kDotCapacity = 5000;
     static constexpr int kLineCapacity = 5000;
     static constexpr int kUniangleCapacity = 1000;
@@ -79,6 +79,8 @@ public:
     static constexpr int kCircleCapacity = 500;
 
 private:
+    // ---- Implementation ---------------------------------------------------
+
     using PolylineBatch2 = Tavo_WiPrimitiveBatch<POINT, 2>;
     using PolylineBatch3 = Tavo_WiPrimitiveBatch<POINT, 3>;
     using PolylineBatch4 = Tavo_WiPrimitiveBatch<POINT, 4>;
@@ -119,6 +121,7 @@ private:
     // GDI's downward y of a core y (the core's y points up).
     int FlipY(int y) const;
 
+    // The nine batches; each allocates its element storage once, here.
     PolylineBatch2 m_dots{kDotCapacity};
     PolylineBatch2 m_lines{kLineCapacity};
     PolylineBatch5 m_hollowRects{kHollowRectCapacity};
@@ -133,7 +136,7 @@ private:
     unsigned int m_fontHeight = 0;
     bool m_blackAndWhite = false;
     int m_thickenVertLine = 0;
-    int m_minFont = 8;
+    int m_minFont = kDefaultMinFont;
     int m_lastDotX = kNoDot;
     int m_lastDotY = kNoDot;
 
@@ -147,11 +150,14 @@ private:
     HGDIOBJ m_oldFont = nullptr;
 
     Tavo_GrSurfaceStats m_stats;
-    unsigned char m_textAlign = 5;
+    unsigned char m_textAlign = 5; // left, bottom: what SetDC selects
     unsigned char m_color = kNoAttrCode;
     unsigned char m_fill = kNoAttrCode;
 
-    static constexpr int kNoDot = static_cast<int>(0x80000000u);
+    // No dot added yet: no core position equals it in practice.
+    static constexpr int kNoDot = INT_MIN;
+    // Smallest font height in pixels unless BRY_VWR_MINFONT says otherwise.
+    static constexpr int kDefaultMinFont = 8;
     // Neither a colour nor a fill code: the first attribute change rebuilds all.
     static constexpr unsigned char kNoAttrCode = 157;
 
