@@ -72,8 +72,6 @@ struct ThreadState {
   // Window creation: the object that the next created window attaches to.
   CWnd* windowBeingCreated = nullptr;
   HHOOK creationHook = nullptr;
-
-  ~ThreadState();
 };
 
 // The calling thread's state.

@@ -29,17 +29,18 @@ CGdiObject* NewTemporaryGdiObject(HGDIOBJ hObject)
 
 }  // namespace
 
-ThreadState::~ThreadState()
-{
-  windows.DeleteTemporaries(ReleaseWindowHandle);
-  dcs.DeleteTemporaries(ReleaseDcHandles);
-  gdiObjects.DeleteTemporaries(ReleaseGdiHandle);
-}
+// The state outlives the thread's other thread-local and static objects:
+// windows and DCs held by globals may still reach it while the process
+// ends. At thread exit only the temporary objects are deleted.
+struct ThreadStateHolder {
+  ThreadState* state = new ThreadState;
+  ~ThreadStateHolder() { DeleteAllTemporaries(); }
+};
 
 ThreadState& CurrentThreadState()
 {
-  static thread_local ThreadState state;
-  return state;
+  static thread_local ThreadStateHolder holder;
+  return *holder.state;
 }
 
 void DeleteAllTemporaries()

@@ -1,0 +1,143 @@
+// controls_test.cpp - CScrollBar and CButton on real controls, and the
+// scroll messages they send to their parent's message map.
+#include <afxwin.h>
+
+#include <vector>
+
+#include <gtest/gtest.h>
+
+#include "framework_test_support.h"
+
+namespace {
+
+constexpr UINT kBarId = 1001;
+constexpr UINT kButtonId = 1003;
+
+struct ScrollEvent {
+  UINT code;
+  UINT position;
+  CScrollBar* bar;
+};
+
+class CScrollParentWnd : public CWnd {
+public:
+  std::vector<ScrollEvent> m_horizontal;
+  std::vector<ScrollEvent> m_vertical;
+
+protected:
+  afx_msg void OnHScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar)
+  {
+    m_horizontal.push_back({nSBCode, nPos, pScrollBar});
+  }
+  afx_msg void OnVScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar)
+  {
+    m_vertical.push_back({nSBCode, nPos, pScrollBar});
+  }
+  DECLARE_MESSAGE_MAP()
+};
+
+BEGIN_MESSAGE_MAP(CScrollParentWnd, CWnd)
+  ON_WM_HSCROLL()
+  ON_WM_VSCROLL()
+END_MESSAGE_MAP()
+
+class ControlsTest : public ::testing::Test {
+protected:
+  void SetUp() override
+  {
+    ASSERT_TRUE(m_parent.CreateEx(0, NULL, "parent", WS_POPUP | WS_VISIBLE, 0, 0, 200, 200, NULL, NULL));
+  }
+  void TearDown() override
+  {
+    framework_test::DispatchPendingMessages();
+    CWinThread().OnIdle(1);
+  }
+  CScrollParentWnd m_parent;
+};
+
+}  // namespace
+
+TEST_F(ControlsTest, ScrollBarIsARealControlAttachedToItsObject)
+{
+  CScrollBar bar;
+  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 10, 10), &m_parent, kBarId));
+  char className[32] = {};
+  ::GetClassNameA(bar.m_hWnd, className, sizeof(className));
+  EXPECT_EQ(0, ::lstrcmpiA("ScrollBar", className));
+  EXPECT_EQ(&bar, CWnd::FromHandlePermanent(bar.m_hWnd));
+  EXPECT_EQ(static_cast<int>(kBarId), bar.GetDlgCtrlID());
+}
+
+TEST_F(ControlsTest, ScrollBarRangePositionAndPageRoundTrip)
+{
+  CScrollBar bar;
+  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 10, 100), &m_parent, kBarId));
+  bar.SetScrollRange(0, 32767);
+  int low = -1;
+  int high = -1;
+  bar.GetScrollRange(&low, &high);
+  EXPECT_EQ(0, low);
+  EXPECT_EQ(32767, high);
+  SCROLLINFO page = {};
+  page.fMask = SIF_PAGE;
+  page.nPage = 100;
+  EXPECT_TRUE(bar.SetScrollInfo(&page));
+  bar.SetScrollPos(500);
+  EXPECT_EQ(500, bar.GetScrollPos());
+  SCROLLINFO read = {};
+  ASSERT_TRUE(bar.GetScrollInfo(&read));
+  EXPECT_EQ(100u, read.nPage);
+  EXPECT_EQ(32767 - 99, bar.GetScrollLimit());
+}
+
+TEST_F(ControlsTest, BarKeyboardScrollReachesParentWithBarObject)
+{
+  CScrollBar bar;
+  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 100, 16), &m_parent, kBarId));
+  bar.SetScrollRange(0, 100);
+  bar.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);
+  ASSERT_FALSE(m_parent.m_horizontal.empty());
+  EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_horizontal.front().code);
+  EXPECT_EQ(&bar, m_parent.m_horizontal.front().bar);
+  EXPECT_TRUE(m_parent.m_vertical.empty());
+}
+
+TEST_F(ControlsTest, ScrollMessageUnpacksCodeAndThumbPosition)
+{
+  CScrollBar bar;
+  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 16, 100), &m_parent, kBarId));
+  m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(bar.m_hWnd));
+  ASSERT_EQ(1u, m_parent.m_vertical.size());
+  EXPECT_EQ(static_cast<UINT>(SB_THUMBTRACK), m_parent.m_vertical[0].code);
+  EXPECT_EQ(4242u, m_parent.m_vertical[0].position);
+  EXPECT_EQ(&bar, m_parent.m_vertical[0].bar);
+}
+
+TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)
+{
+  CButton button;
+  ASSERT_TRUE(button.Create("Corner", WS_CHILD | WS_VISIBLE | BS_AUTOCHECKBOX, CRect(0, 0, 60, 20), &m_parent,
+                            kButtonId));
+  char className[32] = {};
+  ::GetClassNameA(button.m_hWnd, className, sizeof(className));
+  EXPECT_EQ(0, ::lstrcmpiA("Button", className));
+  CString caption;
+  button.GetWindowText(caption);
+  EXPECT_STREQ("Corner", static_cast<LPCSTR>(caption));
+  EXPECT_EQ(static_cast<UINT>(BS_AUTOCHECKBOX), button.GetButtonStyle());
+  button.SetCheck(BST_CHECKED);
+  EXPECT_EQ(BST_CHECKED, button.GetCheck());
+  EXPECT_EQ(&button, m_parent.GetDlgItem(kButtonId));
+}
+
+TEST_F(ControlsTest, ChildControlsDieWithTheirObjects)
+{
+  HWND barWindow = NULL;
+  {
+    CScrollBar bar;
+    ASSERT_TRUE(bar.Create(WS_CHILD | SBS_HORZ, CRect(0, 0, 10, 10), &m_parent, kBarId));
+    barWindow = bar.m_hWnd;
+  }
+  EXPECT_FALSE(::IsWindow(barWindow));
+  EXPECT_EQ(nullptr, m_parent.GetDlgItem(kBarId));
+}

@@ -1,0 +1,9 @@
+// extension_resources.h - resource ids of the test extension library.
+#ifndef TAVO_TESTS_FRAMEWORK_EXTENSION_RESOURCES_H
+#define TAVO_TESTS_FRAMEWORK_EXTENSION_RESOURCES_H
+
+#define IDS_EXTENSION_GREETING 20900
+#define IDS_EXTENSION_SECOND 20901
+#define IDC_EXTENSION_CURSOR 20900
+
+#endif

@@ -1,0 +1,100 @@
+// extension_test.cpp - a class exported by an extension library, deriving
+// from CWnd across the module boundary, and resources found through the
+// extension-module chain.
+#include <afxwin.h>
+
+#include <gtest/gtest.h>
+
+#include "ExtensionWnd.h"
+#include "extension_resources.h"
+#include "framework_test_support.h"
+
+namespace {
+
+HMODULE ExtensionModule() { return ::GetModuleHandleA("afx_test_extension.dll"); }
+
+class ExtensionTest : public ::testing::Test {
+protected:
+  void TearDown() override
+  {
+    framework_test::DispatchPendingMessages();
+    CWinThread().OnIdle(1);
+  }
+};
+
+}  // namespace
+
+TEST_F(ExtensionTest, LibraryJoinedTheChainAtLoad)
+{
+  EXPECT_TRUE(ExtensionLibraryAttached());
+  ASSERT_NE(nullptr, ExtensionModule());
+}
+
+TEST_F(ExtensionTest, ExportedWindowClassGetsItsMessagesAndCWndsDefaults)
+{
+  CWnd parent;
+  ASSERT_TRUE(parent.CreateEx(0, NULL, "parent", WS_POPUP, 0, 0, 100, 100, NULL, NULL));
+  CExtensionWnd wnd;
+  ASSERT_TRUE(wnd.CreateChild(&parent, 5));
+  EXPECT_EQ(1, wnd.m_createCount);
+  wnd.SetWindowPos(NULL, 0, 0, 70, 30, SWP_NOZORDER | SWP_NOMOVE);
+  EXPECT_EQ(70, wnd.m_lastWidth);
+  EXPECT_EQ(0x5A5A, wnd.SendMessage(CExtensionWnd::GetPingMessage(), 0, 99));
+  EXPECT_EQ(99, wnd.m_lastPing);
+  const HWND hWnd = wnd.m_hWnd;
+  EXPECT_TRUE(wnd.DestroyWindow());  // CWnd's own map entry detaches it
+  EXPECT_EQ(nullptr, wnd.m_hWnd);
+  EXPECT_EQ(nullptr, CWnd::FromHandlePermanent(hWnd));
+}
+
+TEST_F(ExtensionTest, StringIsFoundInTheExtensionLibrary)
+{
+  EXPECT_EQ(ExtensionModule(), AfxFindStringResourceHandle(IDS_EXTENSION_GREETING));
+  CString text;
+  ASSERT_TRUE(text.LoadString(IDS_EXTENSION_GREETING));
+  EXPECT_STREQ("Hello from the extension library", static_cast<LPCSTR>(text));
+  const CString second(MAKEINTRESOURCEA(IDS_EXTENSION_SECOND));
+  EXPECT_STREQ("Second string of the block", static_cast<LPCSTR>(second));
+}
+
+TEST_F(ExtensionTest, MissingStringInAnExistingBlockIsNotFound)
+{
+  EXPECT_EQ(AfxGetResourceHandle(), AfxFindStringResourceHandle(IDS_EXTENSION_SECOND + 1));
+}
+
+TEST_F(ExtensionTest, CursorIsFoundInTheExtensionLibrary)
+{
+  EXPECT_EQ(ExtensionModule(), AfxFindResourceHandle(MAKEINTRESOURCEA(IDC_EXTENSION_CURSOR), RT_GROUP_CURSOR));
+  CWinApp app;
+  EXPECT_NE(nullptr, app.LoadCursor(IDC_EXTENSION_CURSOR));
+}
+
+TEST_F(ExtensionTest, MissingResourceGivesTheResourceHandle)
+{
+  EXPECT_EQ(AfxGetResourceHandle(), AfxFindResourceHandle(MAKEINTRESOURCEA(31999), RT_GROUP_CURSOR));
+}
+
+TEST_F(ExtensionTest, ResourceHandleIsSearchedFirst)
+{
+  AfxSetResourceHandle(ExtensionModule());
+  EXPECT_EQ(ExtensionModule(), AfxGetResourceHandle());
+  EXPECT_EQ(ExtensionModule(), AfxFindStringResourceHandle(IDS_EXTENSION_GREETING));
+  AfxSetResourceHandle(NULL);
+  EXPECT_EQ(AfxGetInstanceHandle(), AfxGetResourceHandle());
+}
+
+TEST_F(ExtensionTest, RemovedLinkIsNoLongerSearched)
+{
+  AFX_EXTENSION_MODULE record = {};
+  ASSERT_TRUE(AfxInitExtensionModule(record, ExtensionModule()));
+  EXPECT_TRUE(AfxInitExtensionModule(record, NULL));  // already initialised: unchanged
+  EXPECT_EQ(ExtensionModule(), record.hResource);
+  // A system link for the same module is searched only after application
+  // links; removing the records of this module leaves nothing to find.
+  new CDynLinkLibrary(record, TRUE);
+  AfxTermExtensionModule(record);
+  EXPECT_EQ(AfxGetResourceHandle(), AfxFindStringResourceHandle(IDS_EXTENSION_GREETING));
+  // Put the library back into the chain for the other tests.
+  new CDynLinkLibrary(record);
+  EXPECT_EQ(ExtensionModule(), AfxFindStringResourceHandle(IDS_EXTENSION_GREETING));
+}
