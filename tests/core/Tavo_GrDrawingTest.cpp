@@ -1,6 +1,7 @@
 // Drawing a drawing: the order of calls, the base state the surface sees, item
 // conversion, calls of other drawings, culling through the spatial index and
 // interruption.
+#include "HeapCallCounter.h"
 #include "RecordingSurface.h"
 
 #include "Tavo_GrDrawing.h"
@@ -352,6 +353,46 @@ TEST(DrawingCulling, ItemsAddedAfterAPassAreFound)
     RecordingSurface second;
     drawing.Draw(second, mapping, &clip);
     EXPECT_EQ(second.Count("Dot"), 2);
+}
+
+// ---- Memory ---------------------------------------------------------------------
+
+TEST(DrawingMemory, PassesAfterTheFirstAllocateNothingInTheCore)
+{
+    Tavo_GrDrawing symbol;
+    Tavo_GrDrawingBuilder(symbol).AddCircle(0, 0, 3);
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder build(drawing);
+    for (int i = 0; i < 2000; ++i) {
+        const int x = (i * 37) % 1000;
+        const int y = (i * 91) % 1000;
+        build.SetAttr(Tavo_GrAttr(static_cast<char>(i % 16), static_cast<char>(i % 2), 8));
+        build.AddDot(x, y);
+        build.AddLine(x, y, x + 20, y + 5);
+        const Tavo_GrWPoint shape[6] = {{x, y}, {x + 20, y}, {x + 20, y + 10}, {x + 10, y + 10}, {x + 10, y + 20}, {x, y + 20}};
+        build.AddPolygon(6, shape);
+        build.AddPolyline(6, shape);
+        build.AddText(x, y, "text");
+        build.AddCall(&symbol, x, y);
+    }
+    const Tavo_GrMapping mapping = UnitMapping(drawing);
+    const Tavo_GrDRect most{0, 0, 900, 1000};
+    const Tavo_GrDRect small{100, 100, 200, 200};
+
+    HeapCallCounter counter("libTavo_Core.dll");
+    ASSERT_TRUE(counter.IsCounting());
+    RecordingSurface surface;
+    surface.m_record = false;
+    drawing.Draw(surface, mapping, &most); // builds the index and the reused lists
+    drawing.Draw(surface, mapping, &small);
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_GT(counter.GetCount(), 0) << "the first passes build the index: the counter sees them";
+    counter.Reset();
+    drawing.Draw(surface, mapping, &most);
+    drawing.Draw(surface, mapping, &small);
+    drawing.Draw(surface, mapping, nullptr);
+    EXPECT_EQ(counter.GetCount(), 0);
+    EXPECT_GT(surface.m_items, 0);
 }
 
 // ---- Interruption ---------------------------------------------------------------
