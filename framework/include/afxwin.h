@@ -12,8 +12,11 @@
 // AfxGetResourceHandle give the executable's module (GetModuleHandle(NULL))
 // and the message pump is still available through AfxPumpMessage.
 //
-// Message map entries name their handler with a pointer to member:
-// ON_MESSAGE(WM_X, &CMyWnd::OnX) (the ON_WM_* entries do that themselves).
+// ON_MESSAGE and ON_REGISTERED_MESSAGE take the handler as a pointer to
+// member, ON_MESSAGE(WM_X, &CMyWnd::OnX), which every compiler accepts (the
+// bare name OnX is accepted here too); the ON_WM_* entries name theirs.
+// Exceptions that escape a handler end at the framework's window procedure
+// (the message then returns 0, or -1 for WM_CREATE).
 #ifndef TAVO_FRAMEWORK_AFXWIN_H
 #define TAVO_FRAMEWORK_AFXWIN_H
 

@@ -129,9 +129,11 @@ LRESULT CallWindowProcedure(CWnd* pWnd, HWND hWnd, UINT nMsg, WPARAM wParam, LPA
   try {
     result = pWnd->WindowProc(nMsg, wParam, lParam);
   } catch (CException* e) {
+    ::OutputDebugStringA("afx: a framework exception ended a message handler\n");
     e->Delete();
     result = nMsg == WM_CREATE ? -1 : 0;
   } catch (...) {
+    ::OutputDebugStringA("afx: an exception ended a message handler\n");
     result = nMsg == WM_CREATE ? -1 : 0;
   }
   // A handler that left out the base OnNcDestroy still gets its object

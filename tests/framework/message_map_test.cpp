@@ -32,6 +32,7 @@ public:
   WPARAM m_lastRegisteredWParam = 0;
   int m_postNcDestroyCount = 0;
   bool m_throwOnAppMessage = false;
+  bool m_refuseCreate = false;
 
   BOOL CreateTopLevel(LPVOID param = NULL)
   {
@@ -53,6 +54,7 @@ protected:
   {
     ++m_createCount;
     m_createParam = lpCreateStruct->lpCreateParams;
+    if (m_refuseCreate) return -1;
     return CWnd::OnCreate(lpCreateStruct);
   }
   afx_msg void OnSize(UINT, int cx, int cy)
@@ -142,6 +144,16 @@ TEST_F(MessageMapTest, CreateHooksObjectBeforeFirstMessage)
   EXPECT_TRUE(sawNcCreate);
   EXPECT_EQ(&wnd, CWnd::FromHandlePermanent(wnd.m_hWnd));
   EXPECT_EQ(reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc()), ::GetWindowLongPtrA(wnd.m_hWnd, GWLP_WNDPROC));
+}
+
+TEST_F(MessageMapTest, RefusedCreateFailsAndDetachesTheDeadWindow)
+{
+  CBaseTestWnd wnd;
+  wnd.m_refuseCreate = true;
+  EXPECT_FALSE(wnd.CreateTopLevel());
+  EXPECT_EQ(1, wnd.m_createCount);
+  EXPECT_EQ(NULL, wnd.m_hWnd);
+  EXPECT_EQ(1, wnd.m_postNcDestroyCount);
 }
 
 TEST_F(MessageMapTest, NullClassNameUsesFrameworkDefaultClass)
