@@ -16,9 +16,10 @@
 // everything when the device window is empty too), widened by kClipMarginPixels
 // on every side for the pixels a surface may draw beyond an item's exact
 // extent, and inverted through the transform. A spatial index, built once per
-// layer at the first Draw after items were added, finds those items, so a pass
+// layer at the first pass after items were added, finds those items, so a pass
 // over a small part of a large drawing costs in proportion to what it visits.
-// After the first pass over a drawing, a pass allocates no memory.
+// That first pass also makes room for everything a pass may need, so later
+// passes allocate no memory (until items are added again).
 //
 // World bounds of an item: its points (a circle: centre +- radius; a text at a
 // point: a box of length x charHeight by charHeight on each side of the point's

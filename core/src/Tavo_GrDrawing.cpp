@@ -4,6 +4,7 @@
 
 #include "Tavo_GrDrawingData.h"
 #include "Tavo_GrMapping.h"
+#include "Tavo_GrPolygonFill.h"
 #include "Tavo_GrRound.h"
 #include "Tavo_GrSurface.h"
 
@@ -197,6 +198,19 @@ void DrawItem(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, const Tavo_GrIt
 
 namespace {
 
+// Builds the layer's spatial index and makes room for whatever a pass may
+// visit, once after items were added, so that later passes do not allocate.
+void PrepareLayer(Tavo_GrDrawingData& data, Tavo_GrLayerData& layer)
+{
+    if (layer.spatialIndex.IsBuilt())
+        return;
+    layer.spatialIndex.Build(layer.bounds);
+    layer.hits.reserve(layer.items.size());
+    layer.marks.assign(layer.items.size(), 0);
+    data.devicePoints.reserve(data.largestPointCount);
+    Tavo_GrPolygonScratch().reserve(data.largestPointCount);
+}
+
 bool Contains(const Tavo_GrWRect& outer, const Tavo_GrWRect& inner)
 {
     return outer.x1 <= inner.x1 && outer.y1 <= inner.y1 && inner.x2 <= outer.x2 && inner.y2 <= outer.y2;
@@ -220,9 +234,6 @@ template <typename KeepGoing>
 bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_GrLayerData& layer, KeepGoing keepGoing,
                       const Tavo_GrWRect& clip)
 {
-    if (!layer.spatialIndex.IsBuilt())
-        layer.spatialIndex.Build(layer.bounds);
-
     // A drawing that calls itself meets its own busy lists: the inner pass then
     // uses lists of its own.
     std::vector<uint32_t> ownHits;
@@ -276,6 +287,9 @@ bool Tavo_GrDrawing::DrawItems(Tavo_GrSurface& surface, bool withLayers) const
         surface.m_itemsSincePoll = 0;
         return !surface.PollDrawInterrupt() && !surface.m_drawingInterrupted;
     };
+
+    for (const std::unique_ptr<Tavo_GrLayer>& layerObject : data.layers)
+        PrepareLayer(data, *layerObject->m_data);
 
     for (const std::unique_ptr<Tavo_GrLayer>& layerObject : data.layers) {
         Tavo_GrLayerData& layer = *layerObject->m_data;

@@ -109,6 +109,7 @@ bool Tavo_GrDrawingBuilder::AddItem(int kind, const Tavo_GrWPoint* points, int p
                                       : Tavo_GrWRect{std::min(data.bounds.x1, bounds.x1), std::min(data.bounds.y1, bounds.y1),
                                                      std::max(data.bounds.x2, bounds.x2), std::max(data.bounds.y2, bounds.y2)};
     ++data.itemCount;
+    data.largestPointCount = std::max(data.largestPointCount, pointCount);
     return true;
 }
 

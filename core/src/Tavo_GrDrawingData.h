@@ -66,6 +66,7 @@ struct Tavo_GrDrawingData {
     std::vector<Tavo_GrCall> calls;
     Tavo_GrWRect bounds;
     int itemCount = 0;
+    int largestPointCount = 0; // of the polylines and polygons
 
     // Device points of the polyline or polygon being drawn.
     std::vector<Tavo_GrDPoint> devicePoints;

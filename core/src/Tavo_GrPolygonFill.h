@@ -14,6 +14,9 @@
 template <typename Emit>
 void Tavo_GrFillPolygon(int count, const Tavo_GrDPoint* points, std::vector<int>& scratch, Emit emit);
 
+// The reused storage of the polygons a surface fills (Tavo_GrSurface::DrawPolygon).
+std::vector<int>& Tavo_GrPolygonScratch();
+
 namespace Tavo_GrPolygonFillDetail {
 
 constexpr int kMaxEarClippingPoints = 2000;

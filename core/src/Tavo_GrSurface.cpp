@@ -24,6 +24,13 @@ int SaturatedMinus(int value, int delta)
 
 } // namespace
 
+// Reused between calls so that drawing passes do not allocate.
+std::vector<int>& Tavo_GrPolygonScratch()
+{
+    static std::vector<int> scratch;
+    return scratch;
+}
+
 Tavo_GrSurface::Tavo_GrSurface() = default;
 
 // ---- Calls ------------------------------------------------------------------
@@ -129,9 +136,7 @@ void Tavo_GrSurface::DrawPolygon(int count, Tavo_GrDPoint* points, Tavo_GrAttr* 
             DrawLine(points[count - 1], points[0], attr);
         return;
     }
-    // Reused between calls so that drawing passes do not allocate.
-    static std::vector<int> scratch;
-    Tavo_GrFillPolygon(count, points, scratch,
+    Tavo_GrFillPolygon(count, points, Tavo_GrPolygonScratch(),
                        [&](const Tavo_GrDPoint& a, const Tavo_GrDPoint& b, const Tavo_GrDPoint& c) {
                            Tavo_GrDPoint triangle[3] = {a, b, c};
                            DrawTriangle(triangle, attr);
