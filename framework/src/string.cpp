@@ -8,8 +8,6 @@
 
 namespace {
 
-constexpr int kLoadStringBuffer = 4096;  // characters of the longest string resource loaded
-
 std::string FromNullable(LPCSTR lpsz) { return lpsz == NULL ? std::string() : std::string(lpsz); }
 
 int ClampIndex(int value, int length) { return std::max(0, std::min(value, length)); }
@@ -248,10 +246,17 @@ void CString::AppendFormat(LPCSTR lpszFormat, ...)
 
 BOOL CString::LoadString(UINT nID)
 {
-  char buffer[kLoadStringBuffer];
-  const int length = ::LoadStringA(AfxFindStringResourceHandle(nID), nID, buffer, kLoadStringBuffer);
+  // With no buffer, LoadStringW hands back the resource's own text, so a
+  // string of any length converts in one go.
+  const HINSTANCE module = AfxFindStringResourceHandle(nID);
+  LPCWSTR resourceText = NULL;
+  const int wideLength = ::LoadStringW(module, nID, reinterpret_cast<LPWSTR>(&resourceText), 0);
+  if (wideLength <= 0 || resourceText == NULL) return FALSE;
+  const int length = ::WideCharToMultiByte(CP_ACP, 0, resourceText, wideLength, NULL, 0, NULL, NULL);
   if (length <= 0) return FALSE;
-  m_text.assign(buffer, static_cast<size_t>(length));
+  std::string text(static_cast<size_t>(length), '\0');
+  ::WideCharToMultiByte(CP_ACP, 0, resourceText, wideLength, &text[0], length, NULL, NULL);
+  m_text = std::move(text);
   return TRUE;
 }
 
