@@ -190,6 +190,31 @@ TEST_F(PrintTest, PrinterDcFromDefaultsIsAPrinter)
   info.m_pPD->m_pd.hDevMode = info.m_pPD->m_pd.hDevNames = NULL;  // the application's
 }
 
+TEST_F(PrintTest, PrinterDcPrintsAPageToAFile)
+{
+  CWinApp app;
+  CDC dc;
+  ASSERT_TRUE(app.CreatePrinterDC(dc));
+  char directory[MAX_PATH] = {};
+  ::GetTempPathA(MAX_PATH, directory);
+  const CString path = CString(directory) + "afx_print_test.ps";
+  ::DeleteFileA(path);
+  DOCINFOA job = {};
+  job.cbSize = sizeof(job);
+  job.lpszDocName = "framework test";
+  job.lpszOutput = path;
+  ASSERT_GT(dc.StartDoc(&job), 0);
+  ASSERT_GT(dc.StartPage(), 0);
+  EXPECT_TRUE(dc.TextOut(100, 100, CString("printed through CDC")));
+  EXPECT_TRUE(dc.Rectangle(50, 50, 400, 300));
+  EXPECT_GT(dc.EndPage(), 0);
+  EXPECT_GT(dc.EndDoc(), 0);
+  WIN32_FILE_ATTRIBUTE_DATA attributes = {};
+  ASSERT_TRUE(::GetFileAttributesExA(path, GetFileExInfoStandard, &attributes));
+  EXPECT_GT(attributes.nFileSizeLow, 0u);
+  ::DeleteFileA(path);
+}
+
 TEST(PrintDialogWithoutPrinterData, CreatePrinterDcGivesNull)
 {
   CPrintDialog dialog(FALSE);
