@@ -10,6 +10,7 @@
 
 #include <cstdlib>
 #include <string>
+#include <utility>
 
 using namespace ScrollTest;
 
@@ -43,6 +44,12 @@ protected:
 
     void TearDown() override
     {
+        // No button stays down for the next test.
+        const std::pair<int, DWORD> buttons[] = {{VK_LBUTTON, LeftUp}, {VK_RBUTTON, RightUp},
+                                                 {VK_MBUTTON, MOUSEEVENTF_MIDDLEUP}};
+        for (const auto& button : buttons)
+            if (::GetAsyncKeyState(button.first) & 0x8000)
+                Input(button.second, CPoint(1, 1), 1900);
         ::ReleaseCapture();
         wnd.DestroyWindow();
         PumpPending();
@@ -145,8 +152,10 @@ TEST_F(ScrolleeTest, DragHoldsTheCaptureSoMovesOutsideAreReported)
     FireHoldTimer();
     EXPECT_EQ(::GetCapture(), Scrollee());
     Input(MoveOnly, CPoint(450, 60), 1400);   // outside the scrollee, inside the host
+    Input(LeftUp, CPoint(450, 60), 1500);
     ASSERT_EQ(wnd.CallsNamed("DragMove").size(), 1u);
     EXPECT_EQ(wnd.CallsNamed("DragMove")[0].point, CPoint(450, 60));
+    EXPECT_EQ(wnd.CallsNamed("DragEnd")[0].point, CPoint(450, 60));
 }
 
 TEST_F(ScrolleeTest, MoveWithoutAButtonFlagDuringADragIsNotReported)
@@ -159,6 +168,7 @@ TEST_F(ScrolleeTest, MoveWithoutAButtonFlagDuringADragIsNotReported)
     ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_RBUTTON, MAKELPARAM(7, 8));
     const std::vector<Call> expected = {{"DragMove", MK_LBUTTON, MK_RBUTTON, {7, 8}, -1}};
     EXPECT_EQ(wnd.CallsNamed("DragMove"), expected);
+    Input(LeftUp, CPoint(50, 60), 1500);
 }
 
 TEST_F(ScrolleeTest, AnotherWindowTakingTheCaptureEndsTheDragIncomplete)
