@@ -48,13 +48,7 @@ CWnd* CWnd::SetParent(CWnd* pWndNewParent) { return FromHandle(::SetParent(m_hWn
 CWnd* CWnd::GetTopLevelParent() const
 {
   if (m_hWnd == NULL) return NULL;
-  HWND hWnd = m_hWnd;
-  while ((::GetWindowLongPtrA(hWnd, GWL_STYLE) & WS_CHILD) != 0) {
-    const HWND parent = ::GetParent(hWnd);
-    if (parent == NULL) break;
-    hWnd = parent;
-  }
-  return FromHandle(hWnd);
+  return FromHandle(::GetAncestor(m_hWnd, GA_ROOT));
 }
 BOOL CWnd::IsChild(const CWnd* pWnd) const { return ::IsChild(m_hWnd, pWnd->GetSafeHwnd()); }
 CWnd* CWnd::GetDlgItem(int nID) const { return FromHandle(::GetDlgItem(m_hWnd, nID)); }
