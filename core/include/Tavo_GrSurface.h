@@ -9,7 +9,16 @@
 //   3. BeginDrawing(drawing): no current attribute any more, so the first
 //      SetCurrentAttr of the pass always calls OnAttrChange
 //   4. for every visible layer, in order: BeginLayer(layer), the items of the
-//      layer that meet the clip, in the order they were added, EndLayer()
+//      layer that meet the clip, in the order they were added, EndLayer().
+//      Item kinds go to: dot DrawDot, line DrawLine, polyline DrawPline,
+//      polygon DrawPolygon, rectangle DrawRect (a normalised device rectangle),
+//      circle DrawCircle (radius scaled and rounded), triangle DrawTriangle,
+//      text at a point DrawText(text, point, attr), text in a box
+//      DrawText(text, box, attr, fontHeight) with fontHeight the character
+//      height in pixels (rounded, never below 0), calls DrawCall, DrawEHCall or
+//      DrawEHSignalCall by the call's kind. The base call operations draw the
+//      called drawing's items (without BeginLayer/EndLayer) through the same
+//      surface with the transform moved by the call's offset.
 //   5. Flush()
 //   6. EndDrawing()
 //
