@@ -123,8 +123,9 @@ public:
     void SetParkedCursorMonitorFlag(int flag);
 
     // ---- message handlers --------------------------------------------------
-    // The scroll-bar pointer is not used; n is the thumb position in bar units
-    // for the thumb codes and the percentage for PercentBack/PercentForward.
+    // n is the thumb position in bar units for the thumb codes (of which the
+    // message carries only the low 16 bits; the bar, when given, supplies the
+    // rest) and the percentage for PercentBack/PercentForward.
     afx_msg void OnHScroll(UINT code, UINT n, CScrollBar* bar);
     afx_msg void OnVScroll(UINT code, UINT n, CScrollBar* bar);
     afx_msg void OnSize(UINT type, int width, int height);

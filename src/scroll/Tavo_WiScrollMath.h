@@ -8,8 +8,9 @@
 // positions clamp instead of wrapping.
 #pragma once
 
+#include "Tavo_GrRound.h"
+
 #include <climits>
-#include <cmath>
 
 namespace Tavo_WiScrollMath {
 
@@ -37,12 +38,6 @@ inline int Truncate(double value)
     if (value <= static_cast<double>(INT_MIN))
         return INT_MIN;
     return static_cast<int>(value);
-}
-
-// The nearest integer, halves away from zero, saturated into int range.
-inline int Round(double value)
-{
-    return Truncate(value < 0.0 ? value - 0.5 : value + 0.5);
 }
 
 inline int Add(int a, long long b)
@@ -99,11 +94,11 @@ inline long long TruncatedPercentOf(int extent, unsigned int percent)
     return static_cast<long long>(extent) * percent / 100;
 }
 
-// A step of percent of extent in the direction sign, the nearest integer
-// (the vertical percentage).
+// A step of percent of extent in the direction sign, the nearest integer,
+// halves away from zero (the vertical percentage).
 inline int RoundedPercentOf(int extent, unsigned int percent, int sign)
 {
-    return Round(sign * static_cast<double>(percent) * extent / 100.0);
+    return Tavo_GrRound(sign * static_cast<double>(percent) * extent / 100.0);
 }
 
 }  // namespace Tavo_WiScrollMath
