@@ -91,6 +91,30 @@ TEST_F(MappingTest, ChangesZoomLevelTellsWhetherAZoomWouldMove)
     EXPECT_TRUE(m_mapping.ChangesZoomLevel(Tavo_GrZoom::Out, 1));
 }
 
+TEST_F(MappingTest, ZoomReportsWhetherTheViewChanged)
+{
+    EXPECT_EQ(m_mapping.Zoom(Tavo_GrZoom::ZeroLevel, 0, 0, 1), 0) << "already at the zero level";
+    EXPECT_NE(m_mapping.Zoom(Tavo_GrZoom::ToLevel, 500, 250, 3), 0);
+    EXPECT_EQ(m_mapping.Zoom(Tavo_GrZoom::ToLevel, 500, 250, 3), 0);
+    EXPECT_NE(m_mapping.Zoom(Tavo_GrZoom::ZeroLevel, 0, 0, 1), 0);
+}
+
+TEST_F(MappingTest, UnknownZoomTypesKeepTheLevel)
+{
+    m_mapping.Zoom(Tavo_GrZoom::ToLevel, 500, 250, 4);
+    EXPECT_FALSE(m_mapping.ChangesZoomLevel(static_cast<Tavo_GrZoom::Type>(7), 3));
+    m_mapping.Zoom(static_cast<Tavo_GrZoom::Type>(7), 500, 250, 3);
+    EXPECT_EQ(m_mapping.GetRealZoomLevel(), 4.0);
+}
+
+TEST_F(MappingTest, ALevelThatIsNotANumberIsTheZeroLevel)
+{
+    m_mapping.Zoom(Tavo_GrZoom::ToLevel, 500, 250, 4);
+    m_mapping.Zoom(std::nan(""), 10, 10);
+    EXPECT_EQ(m_mapping.GetRealZoomLevel(), 0.0);
+    EXPECT_EQ(m_mapping.GetWorldClipBox(), (Tavo_GrWRect{0, -250, 1000, 750}));
+}
+
 TEST_F(MappingTest, MaximumZoomLevelLimitsZoomingIn)
 {
     m_mapping.SetMaxZoomLevel(7);
