@@ -663,7 +663,8 @@ AFX_FRAMEWORK_API LRESULT CALLBACK AfxWndProc(HWND hWnd, UINT nMsg, WPARAM wPara
 AFX_FRAMEWORK_API WNDPROC AFXAPI AfxGetAfxWndProc();
 
 // Registers lpWndClass unless a class of that name is registered already for
-// its instance (then TRUE without change). The framework creates windows of
+// its instance (then TRUE without change). FALSE for a NULL description, one
+// without a class name or window procedure, or a failed registration. The framework creates windows of
 // a class registered here with the instance the class was registered for.
 AFX_FRAMEWORK_API BOOL AFXAPI AfxRegisterClass(WNDCLASS* lpWndClass);
 

@@ -3,6 +3,7 @@
 #include <afxwin.h>
 
 #include <mutex>
+#include <vector>
 
 namespace {
 
@@ -38,18 +39,30 @@ bool HasString(HINSTANCE hInst, UINT nID)
   return *entry != 0;
 }
 
+// The modules of the chain in search order: application libraries, newest
+// first, then system libraries. Copied out so that no lock is held while the
+// system looks into a module (resource lookup may take the loader's lock,
+// which a library being loaded holds while it joins the chain).
+std::vector<HMODULE> ChainInSearchOrder()
+{
+  std::vector<HMODULE> modules;
+  std::lock_guard<std::mutex> lock(ChainMutex());
+  for (int pass = 0; pass < 2; ++pass) {
+    const BOOL wantSystem = pass == 1;
+    for (CDynLinkLibrary* link = g_firstLibrary; link != NULL; link = link->m_pNextDLL) {
+      if (link->m_bSystem == wantSystem) modules.push_back(link->m_hResource);
+    }
+  }
+  return modules;
+}
+
 template <class Has>
 HINSTANCE FindInChain(Has has)
 {
   const HINSTANCE resourceHandle = AfxGetResourceHandle();
   if (has(resourceHandle)) return resourceHandle;
-  std::lock_guard<std::mutex> lock(ChainMutex());
-  // Application libraries first, then the system's.
-  for (int pass = 0; pass < 2; ++pass) {
-    const BOOL wantSystem = pass == 1;
-    for (CDynLinkLibrary* link = g_firstLibrary; link != NULL; link = link->m_pNextDLL) {
-      if (link->m_bSystem == wantSystem && has(link->m_hResource)) return link->m_hResource;
-    }
+  for (const HMODULE module : ChainInSearchOrder()) {
+    if (has(module)) return module;
   }
   return resourceHandle;
 }

@@ -169,7 +169,8 @@ WNDPROC AfxGetAfxWndProc() { return &AfxWndProc; }
 
 BOOL AfxRegisterClass(WNDCLASS* lpWndClass)
 {
-  if (lpWndClass == NULL || lpWndClass->lpszClassName == NULL) return FALSE;
+  // A class without a name or a window procedure could only fail later.
+  if (lpWndClass == NULL || lpWndClass->lpszClassName == NULL || lpWndClass->lpfnWndProc == NULL) return FALSE;
   WNDCLASSA existing = {};
   if (!::GetClassInfoA(lpWndClass->hInstance, lpWndClass->lpszClassName, &existing)) {
     if (!::RegisterClassA(lpWndClass)) return FALSE;

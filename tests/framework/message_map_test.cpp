@@ -323,6 +323,18 @@ TEST_F(MessageMapTest, RegisterClassTwiceSucceedsAndWindowsOfItAreHooked)
   EXPECT_EQ(kAppAnswer, wnd.SendMessage(kAppMessage));
 }
 
+TEST_F(MessageMapTest, RegisterClassRefusesIncompleteDescriptions)
+{
+  EXPECT_FALSE(AfxRegisterClass(NULL));
+  WNDCLASSA unnamed = {};
+  unnamed.lpfnWndProc = AfxGetAfxWndProc();
+  EXPECT_FALSE(AfxRegisterClass(&unnamed));
+  WNDCLASSA noProcedure = {};
+  noProcedure.hInstance = AfxGetInstanceHandle();
+  noProcedure.lpszClassName = "TavoAfxTestClassWithoutProcedure";
+  EXPECT_FALSE(AfxRegisterClass(&noProcedure));
+}
+
 TEST_F(MessageMapTest, WindowsCreatedInsideCreateHandlersAttachToTheirOwnObjects)
 {
   struct COuterWnd : CBaseTestWnd {
