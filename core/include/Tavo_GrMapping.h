@@ -102,7 +102,9 @@ public:
     // Whether Zoom(type, ..., amount) would change the zoom level.
     bool ChangesZoomLevel(Tavo_GrZoom::Type type, int amount) const;
     // The largest level (limited to 0 ... largest zoom) at which the whole
-    // rectangle fits into the device window.
+    // rectangle fits into the device window; a whole level when one lies
+    // within one world unit of the rectangle (so the clip box read at a whole
+    // level, rounded to whole units, gives back that level).
     double GetEnclosingZoomLevel(const Tavo_GrWRect& rect) const;
 
     int GetZoomLevel() const { return m_zoomLevel; }

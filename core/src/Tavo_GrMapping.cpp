@@ -146,7 +146,13 @@ double Tavo_GrMapping::GetEnclosingZoomLevel(const Tavo_GrWRect& rect) const
         return 0.0;
     const double rw = std::max(std::fabs(static_cast<double>(rect.x2) - rect.x1), 1.0);
     const double rh = std::max(std::fabs(static_cast<double>(rect.y2) - rect.y1), 1.0);
-    return LimitLevel(LevelOfScale(std::min(m_deviceWidth / rw, m_deviceHeight / rh)));
+    const double fits = LevelOfScale(std::min(m_deviceWidth / rw, m_deviceHeight / rh));
+    // Corners are whole world units: a rectangle read from the view of a whole
+    // level (its clip box, rounded) is up to a unit smaller than that view.
+    // When a whole level lies within one unit of the rectangle, that level it is.
+    const double fitsOneUnitMore = LevelOfScale(std::min(m_deviceWidth / (rw + 1.0), m_deviceHeight / (rh + 1.0)));
+    const double whole = std::floor(fits);
+    return LimitLevel(whole >= fitsOneUnitMore ? whole : fits);
 }
 
 void Tavo_GrMapping::SetMaxZoomLevel(int level)

@@ -160,6 +160,23 @@ TEST_F(MappingTest, EnclosingZoomLevelBetweenWholeLevelsReadsAsTheRealLevel)
     EXPECT_EQ(m_mapping.GetZoomLevel(), static_cast<int>(std::ceil(m_mapping.GetRealZoomLevel())));
 }
 
+TEST(MappingEnclosingLevel, TheClipBoxOfAWholeLevelGivesBackThatLevel)
+{
+    Tavo_GrDrawing drawing;
+    Tavo_GrDrawingBuilder(drawing).AddRect(0, 0, 1003, 500);
+    Tavo_GrMapping mapping(&drawing, 5);
+    mapping.SetZeroLevelExpansion(10); // 1203.6 units wide: the clip box rounds to 1203
+    mapping.SetDeviceWindowSize(400, 400, true, nullptr);
+    const Tavo_GrWRect zeroLevelBox = mapping.GetWorldClipBox();
+    ASSERT_EQ(zeroLevelBox.x2 - zeroLevelBox.x1, 1203);
+    EXPECT_EQ(mapping.GetEnclosingZoomLevel(zeroLevelBox), 0.0);
+
+    mapping.Zoom(Tavo_GrZoom::ToLevel, 300, 200, 7);
+    const Tavo_GrWRect levelSevenBox = mapping.GetWorldClipBox();
+    mapping.Zoom(Tavo_GrZoom::ZeroLevel, 0, 0, 1);
+    EXPECT_EQ(mapping.GetEnclosingZoomLevel(levelSevenBox), 7.0);
+}
+
 TEST_F(MappingTest, PanToPutsTheWorldPointAtTheTopLeftCorner)
 {
     m_mapping.Zoom(Tavo_GrZoom::In, 500, 250, 5);
