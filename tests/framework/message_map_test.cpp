@@ -111,6 +111,20 @@ BEGIN_MESSAGE_MAP(CDerivedTestWnd, CBaseTestWnd)
   ON_MESSAGE(kDerivedOnlyMessage, &CDerivedTestWnd::OnDerivedOnly)
 END_MESSAGE_MAP()
 
+// Takes WM_NCDESTROY itself and leaves out the framework's handling.
+class CForgetfulWnd : public CBaseTestWnd {
+public:
+  int m_ncDestroyCount = 0;
+
+protected:
+  afx_msg void OnNcDestroy() { ++m_ncDestroyCount; }
+  DECLARE_MESSAGE_MAP()
+};
+
+BEGIN_MESSAGE_MAP(CForgetfulWnd, CBaseTestWnd)
+  ON_WM_NCDESTROY()
+END_MESSAGE_MAP()
+
 class MessageMapTest : public ::testing::Test {
 protected:
   void SetUp() override
@@ -277,6 +291,18 @@ TEST_F(MessageMapTest, DestroyWindowDetachesObjectAndCallsPostNcDestroy)
   EXPECT_EQ(NULL, CWnd::FromHandlePermanent(hWnd));
   EXPECT_EQ(1, wnd.m_postNcDestroyCount);
   EXPECT_FALSE(wnd.DestroyWindow());
+}
+
+TEST_F(MessageMapTest, ObjectIsDetachedEvenWhenItsNcDestroyHandlerSkipsTheBase)
+{
+  CForgetfulWnd wnd;
+  ASSERT_TRUE(wnd.CreateTopLevel());
+  const HWND hWnd = wnd.m_hWnd;
+  EXPECT_TRUE(wnd.DestroyWindow());
+  EXPECT_EQ(1, wnd.m_ncDestroyCount);
+  EXPECT_EQ(NULL, wnd.m_hWnd);
+  EXPECT_EQ(NULL, CWnd::FromHandlePermanent(hWnd));
+  EXPECT_EQ(1, wnd.m_postNcDestroyCount);
 }
 
 TEST_F(MessageMapTest, DestructorDestroysLiveWindow)
