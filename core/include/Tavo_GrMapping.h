@@ -41,7 +41,8 @@
 //   view is centred on the given world point (else on the middle of the current
 //   view). Without the force flag and above the zero level it keeps the scale
 //   and the world point at the top-left corner: the window shows more or less of
-//   the drawing, and the real level follows the scale.
+//   the drawing, and the real level follows the scale (when that would bring it
+//   to 0 or below, the view becomes the zero level).
 // * Panning. PanTo(p) moves the view, at the same scale, so that the world
 //   point p is at the top-left corner of the device window (where a scroll
 //   window's scroll position is).

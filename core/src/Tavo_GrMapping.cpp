@@ -68,8 +68,14 @@ int Tavo_GrMapping::SetDeviceWindowSize(int width, int height, bool force, const
         return 1;
     }
     // Keep the scale and the top-left corner: the window shows more or less.
+    // Once the whole drawing fits at that scale, the view is the zero level.
+    const double level = LevelOfScale(s);
+    if (level <= 0.0) {
+        ApplyLevel(0.0, cx, cy);
+        return 1;
+    }
     m_transform.m_yOrigin = topY - (m_deviceHeight - m_transform.m_yError) / s;
-    SetRealLevel(LevelOfScale(s));
+    SetRealLevel(level);
     return 1;
 }
 

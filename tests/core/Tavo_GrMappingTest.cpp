@@ -242,6 +242,14 @@ TEST_F(MappingTest, ResizingWithoutForceKeepsScaleAndTopLeftCorner)
     EXPECT_NEAR(m_mapping.GetRealZoomLevel(), 5.0 * std::log2(0.8 / 0.6), 1e-9);
 }
 
+TEST_F(MappingTest, ResizingWithoutForceUntilTheDrawingFitsGoesToTheZeroLevel)
+{
+    m_mapping.Zoom(Tavo_GrZoom::In, 500, 250, 1); // 0.4 * 2^(1/5) = 0.46 pixels per unit
+    m_mapping.SetDeviceWindowSize(800, 800, false, nullptr);
+    EXPECT_EQ(m_mapping.GetRealZoomLevel(), 0.0);
+    EXPECT_DOUBLE_EQ(m_mapping.GetTransform().GetScale(), 0.8);
+}
+
 TEST_F(MappingTest, ResizingToTheSameSizeWithoutForceChangesNothing)
 {
     EXPECT_EQ(m_mapping.SetDeviceWindowSize(400, 400, false, nullptr), 0);
