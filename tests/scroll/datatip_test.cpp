@@ -218,14 +218,6 @@ TEST_F(DataTipTest, KeyPressHidesTheShownTipAtTheNextTick)
     EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{a, 1}, {a, 0}}));
 }
 
-TEST_F(DataTipTest, TicksWithoutAKeyLeaveTheTipShown)
-{
-    tipA.Show(CPoint(10, 20), "steady");
-    Tick(tipA);
-    Tick(tipA);
-    EXPECT_EQ(tipA.IsVisible(), 1);
-}
-
 TEST_F(DataTipTest, KeyPressWhileNoTipIsShownIsForgottenByTheNextShow)
 {
     SendKey('K', FreshTime());

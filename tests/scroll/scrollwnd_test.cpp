@@ -130,6 +130,35 @@ TEST_F(ScrollWndTest, DestructorAloneLeavesNoWindowBehind)
         EXPECT_FALSE(::IsWindow(hwnd));
 }
 
+TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
+{
+    RecordingScrollWnd unborn;
+    unborn.SetScrollRange(0, 1000, 0, 1000);
+    unborn.SetScrollDeltas(CSize(50, 50), CSize(10, 10));
+    unborn.SetScrollWindowExtent(100, 100);
+    unborn.SetScrollPosition(CPoint(2000, -5));
+    unborn.SetScrollDone();
+    EXPECT_EQ(unborn.GetScrollPosition(), CPoint(900, 0));
+    unborn.ScrollWindow(Tavo_WiScroll::Left, Tavo_WiScroll::Page, 0);
+    EXPECT_EQ(unborn.GetScrollPosition(), CPoint(850, 0));
+    EXPECT_TRUE(unborn.ScrollWindowTest(Tavo_WiScroll::Down, Tavo_WiScroll::Limit, 0));
+    unborn.AbortDrag();
+    unborn.OnParkedCursorEnd();
+    EXPECT_EQ(unborn.GetSafeHwnd(), nullptr);
+}
+
+TEST(ScrollWndWithoutWindow, UnknownDirectionOrAmountDoesNothing)
+{
+    RecordingScrollWnd unborn;
+    unborn.SetScrollRange(0, 1000, 0, 1000);
+    unborn.SetScrollPosition(CPoint(500, 500));
+    unborn.Clear();
+    unborn.ScrollWindow(static_cast<Tavo_WiScroll::Dir>(4), Tavo_WiScroll::Line, 0);
+    unborn.ScrollWindow(Tavo_WiScroll::Left, static_cast<Tavo_WiScroll::Amount>(-1), 0);
+    EXPECT_EQ(unborn.GetScrollPosition(), CPoint(500, 500));
+    EXPECT_TRUE(unborn.calls.empty());
+}
+
 // ---- the scroll model on the bars -----------------------------------------------------
 
 TEST_F(ScrollWndTest, BeforeAnyRangeThePositionClampsToTheConstructedRange)
