@@ -337,7 +337,9 @@ public:
   CString& TrimRight();
   CString& Trim();
 
-  // printf-style formatting; the result replaces the contents.
+  // printf-style formatting; the result replaces the contents. A CString
+  // argument for %s is passed as (LPCSTR)text: the compiler refuses the
+  // object itself.
   void AFX_CDECL Format(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
   void FormatV(LPCSTR lpszFormat, va_list argList);
   void AFX_CDECL AppendFormat(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
