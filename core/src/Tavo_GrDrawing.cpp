@@ -234,8 +234,9 @@ template <typename KeepGoing>
 bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_GrLayerData& layer, KeepGoing keepGoing,
                       const Tavo_GrWRect& clip)
 {
-    // A drawing that calls itself meets its own busy lists: the inner pass then
-    // uses lists of its own.
+    // A pass over this drawing started while another one walks it (a surface
+    // that draws the drawing again from one of its operations) finds the
+    // lists busy and uses lists of its own.
     std::vector<uint32_t> ownHits;
     std::vector<uint8_t> ownMarks;
     const bool claimed = !layer.hitsBusy;

@@ -49,8 +49,8 @@ struct Tavo_GrLayerData {
     // Built at the first Draw after items were added (cleared by adding).
     Tavo_GrSpatialIndex spatialIndex;
     // The items a pass visits, kept between passes so that passes do not
-    // allocate; busy while a pass walks them (a drawing that calls itself
-    // uses a storage of its own for the inner pass).
+    // allocate; busy while a pass walks them (a pass started inside that pass
+    // uses storage of its own).
     std::vector<uint32_t> hits;
     // One mark per item, all clear between passes: a pass that visits many
     // items marks them and walks the layer in order instead of sorting.
