@@ -1,5 +1,5 @@
 // controls_test.cpp - CScrollBar and CButton on real controls, and the
-// scroll messages they send to their parent's message map.
+// scroll messages a bar sends to its parent's message map.
 #include <afxwin.h>
 
 #include <vector>
@@ -41,76 +41,54 @@ BEGIN_MESSAGE_MAP(CScrollParentWnd, CWnd)
   ON_WM_VSCROLL()
 END_MESSAGE_MAP()
 
-class ControlsTest : public ::testing::Test {
+class ControlsTest : public framework_test::WindowTest {
 protected:
   void SetUp() override
   {
     ASSERT_TRUE(m_parent.CreateEx(0, NULL, "parent", WS_POPUP | WS_VISIBLE, 0, 0, 200, 200, NULL, NULL));
-  }
-  void TearDown() override
-  {
-    framework_test::DispatchPendingMessages();
-    CWinThread().OnIdle(1);
   }
   CScrollParentWnd m_parent;
 };
 
 }  // namespace
 
-TEST_F(ControlsTest, ScrollBarIsARealControlAttachedToItsObject)
+TEST_F(ControlsTest, ScrollBarIsARealControlWhoseStateRoundTrips)
 {
   CScrollBar bar;
-  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 10, 10), &m_parent, kBarId));
+  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 10, 100), &m_parent, kBarId));
   char className[32] = {};
   ::GetClassNameA(bar.m_hWnd, className, sizeof(className));
   EXPECT_EQ(0, ::lstrcmpiA("ScrollBar", className));
   EXPECT_EQ(&bar, CWnd::FromHandlePermanent(bar.m_hWnd));
   EXPECT_EQ(static_cast<int>(kBarId), bar.GetDlgCtrlID());
-}
-
-TEST_F(ControlsTest, ScrollBarRangePositionAndPageRoundTrip)
-{
-  CScrollBar bar;
-  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 10, 100), &m_parent, kBarId));
   bar.SetScrollRange(0, 32767);
-  int low = -1;
-  int high = -1;
-  bar.GetScrollRange(&low, &high);
-  EXPECT_EQ(0, low);
-  EXPECT_EQ(32767, high);
   SCROLLINFO page = {};
   page.fMask = SIF_PAGE;
   page.nPage = 100;
   EXPECT_TRUE(bar.SetScrollInfo(&page));
+  EXPECT_EQ(32767 - 99, bar.GetScrollLimit());  // the last position that still shows a full page
   bar.SetScrollPos(500);
   EXPECT_EQ(500, bar.GetScrollPos());
-  SCROLLINFO read = {};
-  ASSERT_TRUE(bar.GetScrollInfo(&read));
-  EXPECT_EQ(100u, read.nPage);
-  EXPECT_EQ(32767 - 99, bar.GetScrollLimit());
 }
 
-TEST_F(ControlsTest, BarKeyboardScrollReachesParentWithBarObject)
+TEST_F(ControlsTest, ScrollMessagesReachParentWithBarObjectAndThumbPosition)
 {
-  CScrollBar bar;
-  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 100, 16), &m_parent, kBarId));
-  bar.SetScrollRange(0, 100);
-  bar.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);
+  CScrollBar horizontal;
+  ASSERT_TRUE(horizontal.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 100, 16), &m_parent, kBarId));
+  horizontal.SetScrollRange(0, 100);
+  horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);  // the control itself reports to its parent
   ASSERT_FALSE(m_parent.m_horizontal.empty());
   EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_horizontal.front().code);
-  EXPECT_EQ(&bar, m_parent.m_horizontal.front().bar);
+  EXPECT_EQ(&horizontal, m_parent.m_horizontal.front().bar);
   EXPECT_TRUE(m_parent.m_vertical.empty());
-}
 
-TEST_F(ControlsTest, ScrollMessageUnpacksCodeAndThumbPosition)
-{
-  CScrollBar bar;
-  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 16, 100), &m_parent, kBarId));
-  m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(bar.m_hWnd));
+  CScrollBar vertical;
+  ASSERT_TRUE(vertical.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 20, 16, 120), &m_parent, kBarId + 1));
+  m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(vertical.m_hWnd));
   ASSERT_EQ(1u, m_parent.m_vertical.size());
   EXPECT_EQ(static_cast<UINT>(SB_THUMBTRACK), m_parent.m_vertical[0].code);
   EXPECT_EQ(4242u, m_parent.m_vertical[0].position);
-  EXPECT_EQ(&bar, m_parent.m_vertical[0].bar);
+  EXPECT_EQ(&vertical, m_parent.m_vertical[0].bar);
 }
 
 TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)
@@ -128,16 +106,4 @@ TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)
   button.SetCheck(BST_CHECKED);
   EXPECT_EQ(BST_CHECKED, button.GetCheck());
   EXPECT_EQ(&button, m_parent.GetDlgItem(kButtonId));
-}
-
-TEST_F(ControlsTest, ChildControlsDieWithTheirObjects)
-{
-  HWND barWindow = NULL;
-  {
-    CScrollBar bar;
-    ASSERT_TRUE(bar.Create(WS_CHILD | SBS_HORZ, CRect(0, 0, 10, 10), &m_parent, kBarId));
-    barWindow = bar.m_hWnd;
-  }
-  EXPECT_FALSE(::IsWindow(barWindow));
-  EXPECT_EQ(nullptr, m_parent.GetDlgItem(kBarId));
 }

@@ -4,6 +4,8 @@
 
 #include <afxwin.h>
 
+#include <gtest/gtest.h>
+
 namespace framework_test {
 
 // Dispatches every message already waiting for this thread (posted, sent,
@@ -17,8 +19,15 @@ inline void DispatchPendingMessages()
   }
 }
 
-// A rectangle for test windows, away from the screen's corner.
-inline CRect TestWindowRect() { return CRect(100, 100, 400, 300); }
+// Leaves no message and no temporary object behind for the next test.
+class WindowTest : public ::testing::Test {
+protected:
+  void TearDown() override
+  {
+    DispatchPendingMessages();
+    CWinThread().OnIdle(1);
+  }
+};
 
 }  // namespace framework_test
 

@@ -13,7 +13,6 @@ namespace {
 constexpr int kAllPagesButton = 1056;    // rad1
 constexpr int kSelectionButton = 1057;   // rad2
 constexpr int kPageRangeButton = 1058;   // rad3
-constexpr int kFirstPageBox = 1152;      // edt1
 constexpr UINT kCloseRequest = WM_APP + 40;
 
 // A print dialog that looks at its real controls when it opens, then asks
@@ -27,8 +26,6 @@ public:
 
   int m_initCount = 0;
   bool m_attachedToDialog = false;
-  bool m_hadRadioButtons = false;
-  CString m_firstPageText;
   UINT m_selectionChecked = 0;
   int m_closeRequests = 0;
 
@@ -37,12 +34,6 @@ public:
     const BOOL result = CPrintDialog::OnInitDialog();
     ++m_initCount;
     m_attachedToDialog = ::IsWindow(m_hWnd) && CWnd::FromHandlePermanent(m_hWnd) == this;
-    m_hadRadioButtons = GetDlgItem(kAllPagesButton) != NULL && GetDlgItem(kSelectionButton) != NULL &&
-                        GetDlgItem(kPageRangeButton) != NULL;
-    if (CWnd* firstPage = GetDlgItem(kFirstPageBox)) {
-      firstPage->SetWindowText("7");
-      GetDlgItemText(kFirstPageBox, m_firstPageText);
-    }
     CheckRadioButton(kAllPagesButton, kPageRangeButton, kSelectionButton);
     m_selectionChecked = IsDlgButtonChecked(kSelectionButton);
     PostMessage(kCloseRequest);
@@ -75,7 +66,7 @@ void FreePrinterHandles(PRINTDLG& pd)
   pd.hDevMode = pd.hDevNames = NULL;
 }
 
-class PrintTest : public ::testing::Test {
+class PrintTest : public framework_test::WindowTest {
 protected:
   // Without a printer the system's print dialog would wait for the user to
   // dismiss its complaint, so the printer tests need one.
@@ -85,42 +76,30 @@ protected:
     DWORD length = sizeof(name);
     if (!::GetDefaultPrinterA(name, &length)) GTEST_SKIP() << "no default printer";
   }
-  void TearDown() override
-  {
-    framework_test::DispatchPendingMessages();
-    CWinThread().OnIdle(1);
-  }
 };
 
 }  // namespace
 
 TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
 {
-  CInspectingPrintDialog dialog(IDCANCEL);
-  dialog.m_pd.nMinPage = 1;
-  dialog.m_pd.nMaxPage = 30;
-  EXPECT_EQ(IDCANCEL, dialog.DoModal());
-  EXPECT_EQ(1, dialog.m_initCount);
-  EXPECT_TRUE(dialog.m_attachedToDialog);
-  EXPECT_TRUE(dialog.m_hadRadioButtons);
-  EXPECT_STREQ("7", static_cast<LPCSTR>(dialog.m_firstPageText));
-  EXPECT_EQ(static_cast<UINT>(BST_CHECKED), dialog.m_selectionChecked);
-  EXPECT_EQ(1, dialog.m_closeRequests);
-  EXPECT_EQ(nullptr, dialog.m_hWnd);
-  FreePrinterHandles(dialog.m_pd);
-}
-
-TEST_F(PrintTest, ConfirmedDialogReturnsPrinterDcAndChoice)
-{
-  CInspectingPrintDialog dialog(IDOK);
-  dialog.m_pd.nMinPage = 1;
-  dialog.m_pd.nMaxPage = 30;
-  ASSERT_EQ(IDOK, dialog.DoModal());
-  EXPECT_NE(nullptr, dialog.GetPrinterDC());
-  EXPECT_TRUE(dialog.PrintSelection());  // the selection button was checked in OnInitDialog
-  EXPECT_FALSE(dialog.GetDeviceName().IsEmpty());
-  EXPECT_EQ(nullptr, dialog.m_hWnd);
-  FreePrinterHandles(dialog.m_pd);
+  for (const UINT closeCommand : {IDCANCEL, IDOK}) {
+    SCOPED_TRACE(closeCommand == IDOK ? "confirmed" : "cancelled");
+    CInspectingPrintDialog dialog(closeCommand);
+    dialog.m_pd.nMinPage = 1;
+    dialog.m_pd.nMaxPage = 30;
+    ASSERT_EQ(static_cast<INT_PTR>(closeCommand), dialog.DoModal());
+    EXPECT_EQ(1, dialog.m_initCount);
+    EXPECT_TRUE(dialog.m_attachedToDialog);
+    EXPECT_EQ(static_cast<UINT>(BST_CHECKED), dialog.m_selectionChecked);
+    EXPECT_EQ(1, dialog.m_closeRequests);
+    EXPECT_EQ(nullptr, dialog.m_hWnd);
+    if (closeCommand == IDOK) {
+      EXPECT_NE(nullptr, dialog.GetPrinterDC());
+      EXPECT_TRUE(dialog.PrintSelection());  // the selection button was checked in OnInitDialog
+      EXPECT_FALSE(dialog.GetDeviceName().IsEmpty());
+    }
+    FreePrinterHandles(dialog.m_pd);
+  }
 }
 
 TEST_F(PrintTest, PrintInfoStartsWithFrameworkDefaults)
@@ -173,7 +152,7 @@ TEST_F(PrintTest, ApplicationPrinterDefaultsAreTakenOnceAndKept)
   EXPECT_EQ(app.m_hDevNames, first.hDevNames);
 }
 
-TEST_F(PrintTest, PrinterDcFromDefaultsIsAPrinter)
+TEST_F(PrintTest, PrinterDcFromDefaultsGivesCapabilitiesAsAttributeHandle)
 {
   CWinApp app;
   CPrintInfo info;
@@ -181,50 +160,25 @@ TEST_F(PrintTest, PrinterDcFromDefaultsIsAPrinter)
   const HDC printer = info.m_pPD->CreatePrinterDC();
   ASSERT_NE(nullptr, printer);
   EXPECT_EQ(printer, info.m_pPD->m_pd.hDC);
+  // Drawing on the screen with the printer's measures, as a preview does.
   CDC dc;
-  ASSERT_TRUE(dc.Attach(printer));
+  ASSERT_TRUE(dc.CreateCompatibleDC(NULL));
+  dc.SetAttribDC(printer);
   EXPECT_EQ(DT_RASPRINTER, dc.GetDeviceCaps(TECHNOLOGY));
-  EXPECT_GT(dc.GetDeviceCaps(HORZRES), 0);
-  ::DeleteDC(dc.Detach());
+  EXPECT_EQ(::GetDeviceCaps(printer, HORZRES), dc.GetDeviceCaps(HORZRES));
+  EXPECT_NE(::GetDeviceCaps(dc.m_hDC, HORZRES), dc.GetDeviceCaps(HORZRES));
+  dc.ReleaseAttribDC();
+  ::DeleteDC(printer);
   info.m_pPD->m_pd.hDC = NULL;
   info.m_pPD->m_pd.hDevMode = info.m_pPD->m_pd.hDevNames = NULL;  // the application's
 }
 
-TEST_F(PrintTest, PrinterDcPrintsAPageToAFile)
-{
-  CWinApp app;
-  CDC dc;
-  ASSERT_TRUE(app.CreatePrinterDC(dc));
-  char directory[MAX_PATH] = {};
-  ::GetTempPathA(MAX_PATH, directory);
-  const CString path = CString(directory) + "afx_print_test.ps";
-  ::DeleteFileA(path);
-  DOCINFOA job = {};
-  job.cbSize = sizeof(job);
-  job.lpszDocName = "framework test";
-  job.lpszOutput = path;
-  ASSERT_GT(dc.StartDoc(&job), 0);
-  ASSERT_GT(dc.StartPage(), 0);
-  EXPECT_TRUE(dc.TextOut(100, 100, CString("printed through CDC")));
-  EXPECT_TRUE(dc.Rectangle(50, 50, 400, 300));
-  EXPECT_GT(dc.EndPage(), 0);
-  EXPECT_GT(dc.EndDoc(), 0);
-  WIN32_FILE_ATTRIBUTE_DATA attributes = {};
-  ASSERT_TRUE(::GetFileAttributesExA(path, GetFileExInfoStandard, &attributes));
-  EXPECT_GT(attributes.nFileSizeLow, 0u);
-  ::DeleteFileA(path);
-}
-
-TEST(PrintDialogWithoutPrinterData, CreatePrinterDcGivesNull)
-{
-  CPrintDialog dialog(FALSE);
-  EXPECT_EQ(nullptr, dialog.CreatePrinterDC());
-}
-
-TEST_F(PrintTest, ApplicationCreatesPrinterDcForItsDefaults)
+TEST_F(PrintTest, ApplicationCreatesPrinterDcButDialogWithoutPrinterDataGivesNull)
 {
   CWinApp app;
   CDC dc;
   ASSERT_TRUE(app.CreatePrinterDC(dc));
   EXPECT_EQ(DT_RASPRINTER, dc.GetDeviceCaps(TECHNOLOGY));
+  CPrintDialog dialog(FALSE);
+  EXPECT_EQ(nullptr, dialog.CreatePrinterDC());
 }

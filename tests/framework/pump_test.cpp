@@ -15,8 +15,7 @@ constexpr UINT kProbeMessage = WM_APP + 20;
 
 class CRecordingWnd : public CWnd {
 public:
-  CRecordingWnd(std::vector<CWnd*>& order, BOOL takesMessage = FALSE)
-      : m_order(order), m_takesMessage(takesMessage)
+  CRecordingWnd(std::vector<CWnd*>& order, BOOL takesMessage = FALSE) : m_order(order), m_takesMessage(takesMessage)
   {
   }
   BOOL PreTranslateMessage(MSG* pMsg) override
@@ -25,26 +24,19 @@ public:
     m_order.push_back(this);
     return m_takesMessage;
   }
-  int m_dispatched = 0;
-
-protected:
-  afx_msg LRESULT OnProbe(WPARAM, LPARAM)
+  LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override
   {
-    ++m_dispatched;
-    return 0;
+    if (message == kProbeMessage) ++m_dispatched;
+    return CWnd::WindowProc(message, wParam, lParam);
   }
-  DECLARE_MESSAGE_MAP()
+  int m_dispatched = 0;
 
 private:
   std::vector<CWnd*>& m_order;
   BOOL m_takesMessage;
 };
 
-BEGIN_MESSAGE_MAP(CRecordingWnd, CWnd)
-  ON_MESSAGE(kProbeMessage, &CRecordingWnd::OnProbe)
-END_MESSAGE_MAP()
-
-class PumpTest : public ::testing::Test {
+class PumpTest : public framework_test::WindowTest {
 protected:
   void SetUp() override
   {
@@ -54,7 +46,6 @@ protected:
     ASSERT_TRUE(m_leaf.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 50, 50), &m_middle, 2));
     framework_test::DispatchPendingMessages();
   }
-  void TearDown() override { framework_test::DispatchPendingMessages(); }
 
   std::vector<CWnd*> m_order;
   CRecordingWnd m_top{m_order};
@@ -64,13 +55,18 @@ protected:
 
 }  // namespace
 
-TEST_F(PumpTest, PreTranslateSeesTargetThenEachParent)
+TEST_F(PumpTest, PreTranslateSeesTargetThenEachParentWithOrWithoutApplication)
 {
+  ASSERT_EQ(nullptr, AfxGetApp());
+  ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
+  ASSERT_TRUE(AfxPumpMessage());
+  EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle, &m_top}), m_order);
+  m_order.clear();
   CWinApp app;
   ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
   ASSERT_TRUE(app.PumpMessage());
   EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle, &m_top}), m_order);
-  EXPECT_EQ(1, m_leaf.m_dispatched);
+  EXPECT_EQ(2, m_leaf.m_dispatched);
 }
 
 TEST_F(PumpTest, WindowThatTakesMessageEndsWalkAndDispatch)
@@ -109,36 +105,21 @@ TEST_F(PumpTest, WindowOutsideMainWindowIsAlsoOfferedToMainWindow)
   app.m_pMainWnd = NULL;
 }
 
-TEST_F(PumpTest, StandalonePumpWalksTheSameTree)
+TEST_F(PumpTest, RunDispatchesThenIdlesUntilQuitAndReturnsItsCode)
 {
-  ASSERT_EQ(nullptr, AfxGetApp());
-  ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
-  ASSERT_TRUE(AfxPumpMessage());
-  EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle, &m_top}), m_order);
-}
-
-TEST_F(PumpTest, RunDispatchesUntilQuitAndReturnsItsCode)
-{
-  CWinApp app;
-  ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
-  ::PostQuitMessage(5);
-  EXPECT_EQ(5, app.Run());
-  EXPECT_EQ(1, m_leaf.m_dispatched);
-}
-
-TEST_F(PumpTest, RunCallsOnIdleWhenQueueIsEmpty)
-{
+  constexpr int kExitCode = 5;
   struct CIdleApp : CWinApp {
     LONG m_highestCount = -1;
     BOOL OnIdle(LONG lCount) override
     {
       m_highestCount = lCount;
-      if (lCount >= 1) ::PostQuitMessage(0);
+      if (lCount >= 1) ::PostQuitMessage(kExitCode);
       return CWinApp::OnIdle(lCount);
     }
   } app;
-  framework_test::DispatchPendingMessages();
-  EXPECT_EQ(0, app.Run());
+  ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
+  EXPECT_EQ(kExitCode, app.Run());
+  EXPECT_EQ(1, m_leaf.m_dispatched);
   EXPECT_EQ(1, app.m_highestCount);
 }
 
@@ -152,21 +133,4 @@ TEST_F(PumpTest, DestroyingMainWindowPostsQuit)
   EXPECT_EQ(nullptr, app.m_pMainWnd);
   MSG msg;
   EXPECT_TRUE(::PeekMessageA(&msg, NULL, WM_QUIT, WM_QUIT, PM_REMOVE));
-}
-
-TEST_F(PumpTest, ApplicationObjectIsCurrentWhileItLives)
-{
-  EXPECT_EQ(nullptr, AfxGetApp());
-  {
-    CWinApp app("test app");
-    EXPECT_EQ(&app, AfxGetApp());
-    EXPECT_EQ(::GetModuleHandleA(NULL), AfxGetInstanceHandle());
-    {
-      CWinApp inner;
-      EXPECT_EQ(&inner, AfxGetApp());
-    }
-    EXPECT_EQ(&app, AfxGetApp());
-  }
-  EXPECT_EQ(nullptr, AfxGetApp());
-  EXPECT_EQ(::GetModuleHandleA(NULL), AfxGetInstanceHandle());
 }

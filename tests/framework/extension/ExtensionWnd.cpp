@@ -30,7 +30,6 @@ BOOL ExtensionLibraryAttached() { return g_attached; }
 
 BEGIN_MESSAGE_MAP(CExtensionWnd, CWnd)
   ON_WM_CREATE()
-  ON_WM_SIZE()
   ON_REGISTERED_MESSAGE(g_pingMessage, &CExtensionWnd::OnPing)
 END_MESSAGE_MAP()
 
@@ -45,13 +44,6 @@ int CExtensionWnd::OnCreate(LPCREATESTRUCT lpCreateStruct)
 {
   ++m_createCount;
   return CWnd::OnCreate(lpCreateStruct);
-}
-
-void CExtensionWnd::OnSize(UINT nType, int cx, int cy)
-{
-  ++m_sizeCount;
-  m_lastWidth = cx;
-  CWnd::OnSize(nType, cx, cy);
 }
 
 LRESULT CExtensionWnd::OnPing(WPARAM, LPARAM lParam)

@@ -18,13 +18,10 @@ public:
   static UINT GetPingMessage();
 
   int m_createCount = 0;
-  int m_sizeCount = 0;
-  int m_lastWidth = -1;
   LPARAM m_lastPing = 0;
 
 protected:
   afx_msg int OnCreate(LPCREATESTRUCT lpCreateStruct);
-  afx_msg void OnSize(UINT nType, int cx, int cy);
   afx_msg LRESULT OnPing(WPARAM wParam, LPARAM lParam);
 
   DECLARE_MESSAGE_MAP()
