@@ -100,18 +100,19 @@ TEST_F(DcTest, DcDeletesTheHandleItCreatedUnlessDetached)
   ::DeleteDC(kept);
 }
 
-TEST_F(DcTest, MetricsComeFromAttributeHandle)
+TEST_F(DcTest, DrawingGoesToOutputHandleAndMetricsComeFromAttributeHandle)
 {
+  LOGFONTA tall = {};
+  tall.lfHeight = 40;
+  CFont tallFont;  // declared first: the surfaces' DCs go before the font they hold
+  ASSERT_TRUE(tallFont.CreateFontIndirect(&tall));
   PixelSurface output;
-  const HDC attribute = ::CreateCompatibleDC(NULL);
-  LOGFONTA big = {};
-  big.lfHeight = 40;
-  const HFONT bigFont = ::CreateFontIndirectA(&big);
-  const HGDIOBJ previousFont = ::SelectObject(attribute, bigFont);
-
+  PixelSurface attribute;
+  ::SelectObject(attribute.dc, tallFont);
   CDC dc;
   dc.m_hDC = output.dc;
-  dc.SetAttribDC(attribute);
+  dc.SetAttribDC(attribute.dc);
+
   TEXTMETRICA metrics = {};
   ASSERT_TRUE(dc.GetTextMetrics(&metrics));
   TEXTMETRICA outputMetrics = {};
@@ -119,25 +120,10 @@ TEST_F(DcTest, MetricsComeFromAttributeHandle)
   EXPECT_EQ(40, metrics.tmHeight);
   EXPECT_NE(40, outputMetrics.tmHeight);
   EXPECT_GT(dc.GetTextExtent("Wide text").cy, dc.GetOutputTextExtent("Wide text", 9).cy);
-
   dc.SetTextColor(RGB(1, 2, 3));  // attributes are set on both handles
   EXPECT_EQ(RGB(1, 2, 3), ::GetTextColor(output.dc));
-  EXPECT_EQ(RGB(1, 2, 3), ::GetTextColor(attribute));
+  EXPECT_EQ(RGB(1, 2, 3), ::GetTextColor(attribute.dc));
 
-  dc.ReleaseAttribDC();
-  dc.ReleaseOutputDC();
-  ::SelectObject(attribute, previousFont);
-  ::DeleteObject(bigFont);
-  ::DeleteDC(attribute);
-}
-
-TEST_F(DcTest, OutputGoesToOutputHandleOnly)
-{
-  PixelSurface output;
-  PixelSurface attribute;
-  CDC dc;
-  dc.m_hDC = output.dc;
-  dc.SetAttribDC(attribute.dc);
   dc.FillSolidRect(2, 2, 4, 4, RGB(0, 0, 0));
   dc.MoveTo(0, 10);
   dc.LineTo(20, 10);

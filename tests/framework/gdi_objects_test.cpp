@@ -32,27 +32,20 @@ TEST(GdiObjectOwnership, DestructorDeletesCreatedObjectsButNotDetachedOnes)
   ::DeleteObject(detached);
 }
 
-TEST(GdiObjectOwnership, DeleteObjectDeletesOnceAndEmptiesWrapper)
+TEST(GdiObjectOwnership, WrapperHoldsOneObjectAndDeletesItOnce)
 {
   CBrush brush;
   EXPECT_FALSE(brush.DeleteObject());  // nothing to delete
   ASSERT_TRUE(brush.CreateSolidBrush(RGB(4, 4, 4)));
   const HGDIOBJ deleted = brush.m_hObject;
+  const HBRUSH another = ::CreateSolidBrush(RGB(6, 6, 6));
+  EXPECT_FALSE(brush.Attach(another));  // the first one would leak
+  EXPECT_EQ(deleted, brush.m_hObject);
+  ::DeleteObject(another);
   EXPECT_TRUE(brush.DeleteObject());
   EXPECT_EQ(0u, ::GetObjectType(deleted));
   EXPECT_EQ(nullptr, brush.m_hObject);
   EXPECT_FALSE(brush.DeleteObject());
-}
-
-TEST(GdiObjectOwnership, WrapperHoldingAnObjectRefusesAnother)
-{
-  CPen pen;
-  ASSERT_TRUE(pen.CreatePen(PS_SOLID, 1, RGB(5, 5, 5)));
-  const HGDIOBJ first = pen.m_hObject;
-  const HPEN second = ::CreatePen(PS_DOT, 1, RGB(6, 6, 6));
-  EXPECT_FALSE(pen.Attach(second));
-  EXPECT_EQ(first, pen.m_hObject);
-  ::DeleteObject(second);
 }
 
 TEST(ResourceException, ThrownAcrossTheLibraryAndDeletedByCatcher)

@@ -2,8 +2,6 @@
 // CDC and CGdiObject, and the idle-time deletion of temporary objects.
 #include <afxwin.h>
 
-#include <thread>
-
 #include <gtest/gtest.h>
 
 namespace {
@@ -97,26 +95,4 @@ TEST_F(HandleMapTest, TemporaryObjectsLastUntilIdleAndNeverDestroyTheirHandles)
   EXPECT_EQ(static_cast<DWORD>(OBJ_BRUSH), ::GetObjectType(brush));
   ::DeleteObject(pen);
   ::DeleteObject(brush);
-}
-
-TEST_F(HandleMapTest, LockedTemporaryMapsKeepTheirObjects)
-{
-  AfxLockTempMaps();
-  CDC::FromHandle(m_screen)->SetAttribDC(m_other);
-  AfxLockTempMaps();
-  EXPECT_FALSE(AfxUnlockTempMaps(TRUE));  // still locked once
-  EXPECT_EQ(m_other, CDC::FromHandle(m_screen)->m_hAttribDC);
-  EXPECT_TRUE(AfxUnlockTempMaps(TRUE));
-  EXPECT_EQ(m_screen, CDC::FromHandle(m_screen)->m_hAttribDC);
-}
-
-TEST_F(HandleMapTest, PermanentMapsBelongToTheirThread)
-{
-  CWnd wnd;
-  ASSERT_TRUE(wnd.Attach(m_rawWindow));
-  CWnd* seenByOtherThread = &wnd;
-  std::thread other([&] { seenByOtherThread = CWnd::FromHandlePermanent(m_rawWindow); });
-  other.join();
-  EXPECT_EQ(nullptr, seenByOtherThread);
-  wnd.Detach();
 }

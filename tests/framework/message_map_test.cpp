@@ -112,9 +112,17 @@ using MessageMapTest = framework_test::WindowTest;
 
 }  // namespace
 
-TEST_F(MessageMapTest, CreateHooksObjectBeforeFirstMessage)
+TEST_F(MessageMapTest, CreateHooksObjectsBeforeFirstMessageEvenWhenNested)
 {
-  CBaseTestWnd wnd;
+  // The inner window is created while the outer one is in WM_CREATE.
+  struct CCreatesChildWnd : CBaseTestWnd {
+    CBaseTestWnd m_inner;
+    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override
+    {
+      if (message == WM_CREATE && !m_inner.Create(NULL, NULL, 0, CRect(0, 0, 5, 5), this, 9)) return -1;
+      return CBaseTestWnd::WindowProc(message, wParam, lParam);
+    }
+  } wnd;
   int marker = 0;
   ASSERT_TRUE(wnd.CreateTopLevel(&marker));
   EXPECT_EQ(1, wnd.m_createCount);
@@ -124,6 +132,11 @@ TEST_F(MessageMapTest, CreateHooksObjectBeforeFirstMessage)
   EXPECT_LT(std::find(seen.begin(), seen.end(), WM_NCCREATE), std::find(seen.begin(), seen.end(), WM_CREATE));
   EXPECT_EQ(&wnd, CWnd::FromHandlePermanent(wnd.m_hWnd));
   EXPECT_EQ(reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc()), ::GetWindowLongPtrA(wnd.m_hWnd, GWLP_WNDPROC));
+  EXPECT_EQ(1, wnd.m_inner.m_createCount);
+  EXPECT_EQ(&wnd.m_inner, CWnd::FromHandlePermanent(wnd.m_inner.m_hWnd));
+  EXPECT_NE(0u, wnd.m_inner.GetStyle() & WS_CHILD);
+  EXPECT_EQ(&wnd, wnd.m_inner.GetParent());
+  EXPECT_EQ(&wnd.m_inner, wnd.GetDlgItem(9));
 }
 
 TEST_F(MessageMapTest, FailedCreateLeavesObjectUnattached)
@@ -143,26 +156,6 @@ TEST_F(MessageMapTest, FailedCreateLeavesObjectUnattached)
   const HWND first = attached.m_hWnd;
   EXPECT_FALSE(attached.CreateTopLevel());
   EXPECT_EQ(first, attached.m_hWnd);
-}
-
-TEST_F(MessageMapTest, ChildCreatedInsideCreateHandlerAttachesToItsOwnObject)
-{
-  struct CCreatesChildWnd : CBaseTestWnd {
-    CBaseTestWnd m_inner;
-    LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam) override
-    {
-      if (message == WM_CREATE && !m_inner.Create(NULL, NULL, 0, CRect(0, 0, 5, 5), this, 9)) return -1;
-      return CBaseTestWnd::WindowProc(message, wParam, lParam);
-    }
-  } outer;
-  ASSERT_TRUE(outer.CreateTopLevel());
-  EXPECT_EQ(1, outer.m_createCount);
-  EXPECT_EQ(1, outer.m_inner.m_createCount);
-  EXPECT_EQ(&outer.m_inner, CWnd::FromHandlePermanent(outer.m_inner.m_hWnd));
-  EXPECT_EQ(&outer, CWnd::FromHandlePermanent(outer.m_hWnd));
-  EXPECT_NE(0u, outer.m_inner.GetStyle() & WS_CHILD);
-  EXPECT_EQ(&outer, outer.m_inner.GetParent());
-  EXPECT_EQ(&outer.m_inner, outer.GetDlgItem(9));
 }
 
 TEST_F(MessageMapTest, BaseClassEntriesDispatchAndContainExceptions)

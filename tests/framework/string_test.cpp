@@ -55,18 +55,6 @@ TEST(CStringFormat, FormatsLikePrintfReplacingContentsWithoutTruncation)
   EXPECT_EQ(6000, text.GetLength());
 }
 
-TEST(CStringBuffer, ReleaseBufferTakesLengthFromTerminatorOrArgument)
-{
-  CString text("abc");
-  std::strcpy(text.GetBuffer(10), "longer");
-  text.ReleaseBuffer();
-  EXPECT_EQ("longer", Text(text));
-  EXPECT_EQ(6, text.GetLength());
-  std::memcpy(text.GetBuffer(8), "12345678", 8);
-  text.ReleaseBuffer(4);
-  EXPECT_EQ("1234", Text(text));
-}
-
 TEST(CStringBadInput, OutOfRangePositionsClampOrAreIgnored)
 {
   CString text("0123456789");
