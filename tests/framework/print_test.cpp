@@ -99,7 +99,7 @@ TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
   }
 }
 
-TEST_F(PrintTest, PrintInfoStartsWithFrameworkDefaults)
+TEST_F(PrintTest, PrintInfoStartsWithFrameworkDialogFlagsAndFullPageRange)
 {
   CPrintInfo info;
   ASSERT_NE(nullptr, info.m_pPD);
@@ -110,11 +110,6 @@ TEST_F(PrintTest, PrintInfoStartsWithFrameworkDefaults)
   EXPECT_EQ(0xFFFFu, info.GetMaxPage());
   EXPECT_EQ(1u, info.GetFromPage());
   EXPECT_EQ(0xFFFFu, info.GetToPage());
-  EXPECT_EQ(1u, info.m_nCurPage);
-  EXPECT_TRUE(info.m_bContinuePrinting);
-  EXPECT_FALSE(info.m_bPreview);
-  EXPECT_FALSE(info.m_bDirect);
-  EXPECT_EQ(nullptr, info.m_lpUserData);
   info.SetMaxPage(30);
   EXPECT_EQ(30u, info.m_pPD->m_pd.nMaxPage);
 }
