@@ -89,6 +89,8 @@ private:
 
     int SetCurrentFont(unsigned int pixelHeight);
     void ReleaseGdiObjects();
+    // Clears the handles; releasing what they name is ReleaseGdiObjects' job.
+    void ForgetGdiObjects();
     int GetCharsInBox(const char* text, Tavo_GrDRect& box);
     void DrawTextPlaceholder(Tavo_GrDPoint start, int width, int rightLimit, Tavo_GrAttr* attr);
     void DrawSegment(const Tavo_GrDPoint& from, const Tavo_GrDPoint& to);

@@ -100,12 +100,7 @@ void Tavo_WiWin32Surface::SetDC(HDC dc)
     // A surface whose last pass ended with EndDrawing holds no GDI object, so
     // nothing is deleted here.
     m_hdc = dc;
-    m_pen = nullptr;
-    m_oldPen = nullptr;
-    m_brush = nullptr;
-    m_oldBrush = nullptr;
-    m_font = nullptr;
-    m_oldFont = nullptr;
+    ForgetGdiObjects();
     m_textAlign = 5; // left, bottom
     SetTextAlign(dc, TA_LEFT | TA_BOTTOM);
     SetBkMode(dc, TRANSPARENT);
@@ -228,6 +223,11 @@ void Tavo_WiWin32Surface::ReleaseGdiObjects()
         DeleteObject(m_brush);
     if (m_font)
         DeleteObject(m_font);
+    ForgetGdiObjects();
+}
+
+void Tavo_WiWin32Surface::ForgetGdiObjects()
+{
     m_pen = nullptr;
     m_oldPen = nullptr;
     m_brush = nullptr;
