@@ -1,27 +1,25 @@
 // HeapCounter: counts heap allocations made by the project's own modules (the
-// program and the DLLs beside it) while it lives, by redirecting their imports
-// of the C runtime's allocation functions. C++ operator new of each module
-// ends in malloc, so it is counted too.
+// program and the DLLs beside it) while it lives, with the tests' heap call
+// counter.
 #pragma once
 
-#include "ImportPatch.h"
+#include "HeapCallCounter.h"
 
-#include <memory>
+#include <windows.h>
+
 #include <vector>
 
 class HeapCounter {
 public:
-    HeapCounter();
-    ~HeapCounter();
-    HeapCounter(const HeapCounter&) = delete;
-    HeapCounter& operator=(const HeapCounter&) = delete;
-
     // False when no module imports an allocation function by name.
-    bool IsActive() const { return !m_patches.empty(); }
-    long long GetCount() const;
-    int GetModuleCount() const { return m_moduleCount; }
+    bool IsActive() const { return m_counter.IsCounting(); }
+    long long GetCount() const { return m_counter.GetCount(); }
+    int GetModuleCount() const { return static_cast<int>(m_modules.size()); }
 
 private:
-    std::vector<std::unique_ptr<ImportPatch>> m_patches;
-    int m_moduleCount = 0;
+    // The loaded modules in the program's folder.
+    static std::vector<HMODULE> FindProjectModules();
+
+    std::vector<HMODULE> m_modules = FindProjectModules();
+    HeapCallCounter m_counter{m_modules};
 };

@@ -1,197 +1,139 @@
 #include "GdiCallRecorder.h"
 
 #include <algorithm>
-#include <cstring>
+#include <iterator>
 
 GdiCallRecorder* GdiCallRecorder::s_current = nullptr;
 
 namespace {
 
-const char kSurfaceModule[] = "libTavo_Windows.dll";
-
 template <class Function>
-Function Forward(const char* function)
+Function Forward(GdiCall::Kind kind)
 {
-    return reinterpret_cast<Function>(GdiCallRecorder::Current()->Original(function));
+    return reinterpret_cast<Function>(GdiCallRecorder::Current()->Original(kind));
 }
 
-void Record(GdiCall call)
+void Note(GdiCall call)
 {
     GdiCallRecorder::Current()->Add(std::move(call));
+}
+
+void Note(GdiCall::Kind kind, HGDIOBJ object, UINT value = 0, COLORREF colour = 0)
+{
+    GdiCall call;
+    call.kind = kind;
+    call.object = object;
+    call.value = value;
+    call.colour = colour;
+    Note(std::move(call));
+}
+
+GdiCall BoxCall(GdiCall::Kind kind, int left, int top, int right, int bottom)
+{
+    GdiCall call;
+    call.kind = kind;
+    call.box = {left, top, right, bottom};
+    return call;
 }
 
 BOOL WINAPI RecordPolyPolyline(HDC dc, const POINT* points, const DWORD* counts, DWORD polylines)
 {
     GdiCall call;
-    call.kind = GdiCall::PolyPolyline;
-    call.dc = dc;
     call.counts = counts;
     call.count = static_cast<int>(polylines);
-    size_t total = 0;
-    for (DWORD i = 0; i < polylines; ++i)
-        total += counts[i];
     call.countValues.assign(counts, counts + polylines);
+    DWORD total = 0;
+    for (DWORD n : call.countValues)
+        total += n;
     call.points.assign(points, points + total);
-    Record(std::move(call));
-    return Forward<decltype(&PolyPolyline)>("PolyPolyline")(dc, points, counts, polylines);
+    Note(std::move(call));
+    return Forward<decltype(&PolyPolyline)>(GdiCall::PolyPolyline)(dc, points, counts, polylines);
 }
 
 BOOL WINAPI RecordPolygon(HDC dc, const POINT* points, int count)
 {
     GdiCall call;
     call.kind = GdiCall::Polygon;
-    call.dc = dc;
-    call.count = count;
-    call.points.assign(points, points + (count > 0 ? count : 0));
-    Record(std::move(call));
-    return Forward<decltype(&Polygon)>("Polygon")(dc, points, count);
-}
-
-GdiCall BoxCall(GdiCall::Kind kind, HDC dc, int left, int top, int right, int bottom)
-{
-    GdiCall call;
-    call.kind = kind;
-    call.dc = dc;
-    call.values[0] = left;
-    call.values[1] = top;
-    call.values[2] = right;
-    call.values[3] = bottom;
-    return call;
+    call.points.assign(points, points + std::max(count, 0));
+    Note(std::move(call));
+    return Forward<decltype(&Polygon)>(GdiCall::Polygon)(dc, points, count);
 }
 
 BOOL WINAPI RecordRectangle(HDC dc, int left, int top, int right, int bottom)
 {
-    Record(BoxCall(GdiCall::Rectangle, dc, left, top, right, bottom));
-    return Forward<decltype(&Rectangle)>("Rectangle")(dc, left, top, right, bottom);
+    Note(BoxCall(GdiCall::Rectangle, left, top, right, bottom));
+    return Forward<decltype(&Rectangle)>(GdiCall::Rectangle)(dc, left, top, right, bottom);
 }
 
 BOOL WINAPI RecordEllipse(HDC dc, int left, int top, int right, int bottom)
 {
-    Record(BoxCall(GdiCall::Ellipse, dc, left, top, right, bottom));
-    return Forward<decltype(&Ellipse)>("Ellipse")(dc, left, top, right, bottom);
+    Note(BoxCall(GdiCall::Ellipse, left, top, right, bottom));
+    return Forward<decltype(&Ellipse)>(GdiCall::Ellipse)(dc, left, top, right, bottom);
 }
 
 BOOL WINAPI RecordTextOutA(HDC dc, int x, int y, LPCSTR text, int length)
 {
-    GdiCall call = BoxCall(GdiCall::TextOut, dc, x, y, 0, 0);
-    call.text.assign(text, length > 0 ? length : 0);
-    call.count = length;
-    Record(std::move(call));
-    return Forward<decltype(&TextOutA)>("TextOutA")(dc, x, y, text, length);
+    GdiCall call = BoxCall(GdiCall::TextOut, x, y, 0, 0);
+    call.text.assign(text, std::max(length, 0));
+    Note(std::move(call));
+    return Forward<decltype(&TextOutA)>(GdiCall::TextOut)(dc, x, y, text, length);
 }
 
 HGDIOBJ WINAPI RecordSelectObject(HDC dc, HGDIOBJ object)
 {
-    const HGDIOBJ displaced = Forward<decltype(&SelectObject)>("SelectObject")(dc, object);
     GdiCall call;
     call.kind = GdiCall::SelectObject;
-    call.dc = dc;
     call.object = object;
-    call.displaced = displaced;
-    Record(std::move(call));
-    return displaced;
+    call.displaced = Forward<decltype(&SelectObject)>(GdiCall::SelectObject)(dc, object);
+    Note(call);
+    return call.displaced;
 }
 
 HPEN WINAPI RecordCreatePen(int style, int width, COLORREF colour)
 {
-    const HPEN pen = Forward<decltype(&CreatePen)>("CreatePen")(style, width, colour);
-    GdiCall call;
-    call.kind = GdiCall::CreatePen;
-    call.object = pen;
-    call.value = static_cast<UINT>(style);
-    call.count = width;
-    call.colour = colour;
-    Record(std::move(call));
-    if (pen)
-        GdiCallRecorder::Current()->NoteCreated();
+    const HPEN pen = Forward<decltype(&CreatePen)>(GdiCall::CreatePen)(style, width, colour);
+    Note(GdiCall::CreatePen, pen, 0, colour);
     return pen;
 }
 
 HBRUSH WINAPI RecordCreateBrushIndirect(const LOGBRUSH* description)
 {
-    const HBRUSH brush = Forward<decltype(&CreateBrushIndirect)>("CreateBrushIndirect")(description);
-    GdiCall call;
-    call.kind = GdiCall::CreateBrush;
-    call.object = brush;
-    call.value = description->lbStyle;
-    call.colour = description->lbColor;
-    Record(std::move(call));
-    if (brush)
-        GdiCallRecorder::Current()->NoteCreated();
+    const HBRUSH brush = Forward<decltype(&CreateBrushIndirect)>(GdiCall::CreateBrush)(description);
+    Note(GdiCall::CreateBrush, brush, description->lbStyle, description->lbColor);
     return brush;
 }
 
 HFONT WINAPI RecordCreateFontIndirectA(const LOGFONTA* description)
 {
-    const HFONT font = Forward<decltype(&CreateFontIndirectA)>("CreateFontIndirectA")(description);
-    GdiCall call;
-    call.kind = GdiCall::CreateFont;
-    call.object = font;
-    call.font = *description;
-    Record(std::move(call));
-    if (font)
-        GdiCallRecorder::Current()->NoteCreated();
+    const HFONT font = Forward<decltype(&CreateFontIndirectA)>(GdiCall::CreateFont)(description);
+    Note(GdiCall::CreateFont, font, static_cast<UINT>(description->lfHeight));
     return font;
 }
 
 BOOL WINAPI RecordDeleteObject(HGDIOBJ object)
 {
-    const BOOL deleted = Forward<decltype(&DeleteObject)>("DeleteObject")(object);
-    GdiCall call;
-    call.kind = GdiCall::DeleteObject;
-    call.object = object;
-    Record(std::move(call));
-    if (deleted)
-        GdiCallRecorder::Current()->NoteDeleted();
+    const BOOL deleted = Forward<decltype(&DeleteObject)>(GdiCall::DeleteObject)(object);
+    Note(GdiCall::DeleteObject, object, static_cast<UINT>(deleted));
     return deleted;
-}
-
-GdiCall ValueCall(GdiCall::Kind kind, HDC dc, UINT value)
-{
-    GdiCall call;
-    call.kind = kind;
-    call.dc = dc;
-    call.value = value;
-    return call;
 }
 
 UINT WINAPI RecordSetTextAlign(HDC dc, UINT align)
 {
-    Record(ValueCall(GdiCall::SetTextAlign, dc, align));
-    return Forward<decltype(&SetTextAlign)>("SetTextAlign")(dc, align);
+    Note(GdiCall::SetTextAlign, nullptr, align);
+    return Forward<decltype(&SetTextAlign)>(GdiCall::SetTextAlign)(dc, align);
 }
 
 COLORREF WINAPI RecordSetTextColor(HDC dc, COLORREF colour)
 {
-    Record(ValueCall(GdiCall::SetTextColor, dc, colour));
-    return Forward<decltype(&SetTextColor)>("SetTextColor")(dc, colour);
+    Note(GdiCall::SetTextColor, nullptr, 0, colour);
+    return Forward<decltype(&SetTextColor)>(GdiCall::SetTextColor)(dc, colour);
 }
 
-int WINAPI RecordSetBkMode(HDC dc, int mode)
-{
-    Record(ValueCall(GdiCall::SetBkMode, dc, static_cast<UINT>(mode)));
-    return Forward<decltype(&SetBkMode)>("SetBkMode")(dc, mode);
-}
-
-int WINAPI RecordSetPolyFillMode(HDC dc, int mode)
-{
-    Record(ValueCall(GdiCall::SetPolyFillMode, dc, static_cast<UINT>(mode)));
-    return Forward<decltype(&SetPolyFillMode)>("SetPolyFillMode")(dc, mode);
-}
-
-SHORT WINAPI RecordGetAsyncKeyState(int key)
-{
-    if (key == VK_ESCAPE)
-        return GdiCallRecorder::Current()->IsEscapeDown() ? SHORT(0x8000) : SHORT(0);
-    return Forward<decltype(&GetAsyncKeyState)>("GetAsyncKeyState")(key);
-}
-
-struct Replacement {
+// In the order of GdiCall::Kind.
+const struct {
     const char* function;
     void* replacement;
-};
-
-const Replacement kReplacements[] = {
+} kReplacements[] = {
     {"PolyPolyline", reinterpret_cast<void*>(&RecordPolyPolyline)},
     {"Polygon", reinterpret_cast<void*>(&RecordPolygon)},
     {"Rectangle", reinterpret_cast<void*>(&RecordRectangle)},
@@ -204,9 +146,6 @@ const Replacement kReplacements[] = {
     {"DeleteObject", reinterpret_cast<void*>(&RecordDeleteObject)},
     {"SetTextAlign", reinterpret_cast<void*>(&RecordSetTextAlign)},
     {"SetTextColor", reinterpret_cast<void*>(&RecordSetTextColor)},
-    {"SetBkMode", reinterpret_cast<void*>(&RecordSetBkMode)},
-    {"SetPolyFillMode", reinterpret_cast<void*>(&RecordSetPolyFillMode)},
-    {"GetAsyncKeyState", reinterpret_cast<void*>(&RecordGetAsyncKeyState)},
 };
 
 } // namespace
@@ -214,9 +153,9 @@ const Replacement kReplacements[] = {
 GdiCallRecorder::GdiCallRecorder()
 {
     s_current = this;
-    const HMODULE module = GetModuleHandleA(kSurfaceModule);
-    for (const Replacement& entry : kReplacements)
-        m_redirects.push_back({entry.function, std::make_unique<ImportPatch>(module, entry.function, entry.replacement)});
+    const HMODULE module = GetModuleHandleA("libTavo_Windows.dll");
+    for (const auto& entry : kReplacements)
+        m_redirects.push_back(std::make_unique<ImportPatch>(module, entry.function, entry.replacement));
 }
 
 GdiCallRecorder::~GdiCallRecorder()
@@ -228,36 +167,25 @@ GdiCallRecorder::~GdiCallRecorder()
 bool GdiCallRecorder::IsActive() const
 {
     return std::all_of(m_redirects.begin(), m_redirects.end(),
-                       [](const Redirect& redirect) { return redirect.patch->IsActive(); });
+                       [](const std::unique_ptr<ImportPatch>& patch) { return patch->IsActive(); });
 }
 
-void* GdiCallRecorder::Original(const char* function) const
+void GdiCallRecorder::Add(GdiCall call)
 {
-    for (const Redirect& redirect : m_redirects)
-        if (std::strcmp(redirect.function, function) == 0)
-            return redirect.patch->GetOriginal();
-    return nullptr;
+    const bool made = call.kind == GdiCall::CreatePen || call.kind == GdiCall::CreateBrush
+        || call.kind == GdiCall::CreateFont;
+    if (made && call.object)
+        ++m_created;
+    if (call.kind == GdiCall::DeleteObject && call.value)
+        ++m_deleted;
+    if (m_keepCalls)
+        m_calls.push_back(std::move(call));
 }
 
 std::vector<GdiCall> GdiCallRecorder::Of(GdiCall::Kind kind) const
 {
     std::vector<GdiCall> calls;
-    for (const GdiCall& call : m_calls)
-        if (call.kind == kind)
-            calls.push_back(call);
+    std::copy_if(m_calls.begin(), m_calls.end(), std::back_inserter(calls),
+                 [kind](const GdiCall& call) { return call.kind == kind; });
     return calls;
-}
-
-int GdiCallRecorder::CountOf(GdiCall::Kind kind) const
-{
-    return static_cast<int>(std::count_if(m_calls.begin(), m_calls.end(),
-                                          [kind](const GdiCall& call) { return call.kind == kind; }));
-}
-
-std::vector<GdiCall::Kind> GdiCallRecorder::GetKinds() const
-{
-    std::vector<GdiCall::Kind> kinds;
-    for (const GdiCall& call : m_calls)
-        kinds.push_back(call.kind);
-    return kinds;
 }

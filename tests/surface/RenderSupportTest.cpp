@@ -1,11 +1,8 @@
-// The render program's parts: the PNG writer and the built-in sample drawing.
-#include "SurfaceFixture.h"
-
+// The render program's PNG writer.
+#include "DibCanvas.h"
 #include "PngWriter.h"
-#include "SampleDrawing.h"
 
-#include "Tavo_GrDrawing.h"
-#include "Tavo_GrMapping.h"
+#include <gtest/gtest.h>
 
 #include <wincodec.h>
 #include <wrl/client.h>
@@ -81,32 +78,4 @@ TEST(PngWriter, ReportsAFileThatCannotBeWritten)
     EXPECT_NE("", WritePng(canvas, "Z:\\no such folder\\at all\\picture.png"));
     DibCanvas empty(0, 0);
     EXPECT_NE("", WritePng(empty, TempPngPath()));
-}
-
-TEST(SampleDrawing, ExercisesEveryPrimitiveKindAndText)
-{
-    Tavo_GrDrawing drawing;
-    BuildSampleDrawing(drawing);
-    const Tavo_GrWRect bounds = drawing.GetBounds();
-    EXPECT_EQ(0, bounds.x1);
-    EXPECT_EQ(0, bounds.y1);
-    EXPECT_EQ(kSampleWidth, bounds.x2);
-    EXPECT_EQ(kSampleHeight, bounds.y2);
-
-    DibCanvas canvas(kSampleWidth, kSampleHeight);
-    Tavo_GrMapping mapping(&drawing, 5);
-    mapping.SetDeviceWindowSize(kSampleWidth, kSampleHeight, true, nullptr);
-    Tavo_WiWin32Surface surface;
-    surface.SetDC(canvas.GetDC());
-    drawing.Draw(surface, mapping, nullptr);
-
-    Tavo_GrSurfaceStats stats;
-    surface.FetchStats(stats);
-    for (Tavo_GrSurfaceStats::Counter counter :
-         {Tavo_GrSurfaceStats::Dots, Tavo_GrSurfaceStats::Lines, Tavo_GrSurfaceStats::HollowTriangles,
-          Tavo_GrSurfaceStats::HollowRects, Tavo_GrSurfaceStats::FilledTriangles, Tavo_GrSurfaceStats::FilledRects,
-          Tavo_GrSurfaceStats::Circles, Tavo_GrSurfaceStats::Texts})
-        EXPECT_GT(stats.Get(counter), 0u) << "counter " << counter;
-    for (char colour = 0; colour < 16; ++colour)
-        EXPECT_GT(canvas.CountPixels(ColourOf(colour)), 0) << "colour " << int(colour);
 }

@@ -2,26 +2,18 @@
 // DIB section (and on the recorded calls where pixels cannot tell).
 #include "SurfaceFixture.h"
 
-#pragma push_macro("DrawText")
-#undef DrawText
-
-namespace {
-
-Tavo_GrDPoint At(int x, int y)
-{
-    return Tavo_GrDPoint{x, y};
-}
-
-} // namespace
+#include <algorithm>
 
 class DrawingTest : public SurfaceTest {
 protected:
+    int RedIn(int left, int top, int right, int bottom) const
+    {
+        return m_canvas.CountPixels(ColourOf(kRed), left, top, right, bottom);
+    }
+
     Tavo_GrAttr m_red = Outline(kRed);
     Tavo_GrAttr m_redFilled = Filled(kRed);
-    Tavo_GrAttr m_blue = Outline(kBlue);
 };
-
-// ---- Dots -----------------------------------------------------------------------
 
 TEST_F(DrawingTest, DotIsExactlyOnePixelAtTheFlippedPosition)
 {
@@ -32,286 +24,93 @@ TEST_F(DrawingTest, DotIsExactlyOnePixelAtTheFlippedPosition)
     EXPECT_TRUE(IsColour(17, kHeight - 30, kRed));
 }
 
-TEST_F(DrawingTest, RepeatedDotNeitherDrawsNorChangesTheColour)
+TEST_F(DrawingTest, RectangleEdgesAreInclusive)
 {
-    Tavo_GrDPoint p = At(17, 30);
-    m_surface->DrawDot(p, &m_red);
-    m_surface->DrawDot(p, &m_blue);
-    EndPass();
-    EXPECT_EQ(0, CountColour(kBlue));
-    EXPECT_EQ(1, CountColour(kRed));
-    EXPECT_EQ(1u, Stats().Get(Tavo_GrSurfaceStats::AttrChanges));
-}
-
-// ---- Lines ------------------------------------------------------------------------
-
-TEST_F(DrawingTest, HorizontalLineLeavesOutItsLastPoint)
-{
-    Tavo_GrDPoint a = At(10, 20), b = At(30, 20);
-    m_surface->DrawLine(a, b, &m_red);
-    EndPass();
-    EXPECT_EQ(20, CountColour(kRed));
-    EXPECT_TRUE(IsColour(10, kHeight - 20, kRed));
-    EXPECT_FALSE(IsColour(30, kHeight - 20, kRed));
-}
-
-TEST_F(DrawingTest, VerticalLineFarBeyondTheSurfaceIsClampedAndCoversTheColumn)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint a = At(30, -100), b = At(30, kHeight + 50);
-    m_surface->DrawLine(a, b, &m_red);
-    EndPass();
-    bool found = false;
-    for (const GdiCall& call : recorder.Of(GdiCall::PolyPolyline)) {
-        if (call.count != 1)
-            continue;
-        found = true;
-        EXPECT_EQ(kHeight, call.points[0].y);
-        EXPECT_EQ(-1, call.points[1].y);
-    }
-    EXPECT_TRUE(found);
-    EXPECT_EQ(kHeight, m_canvas.CountPixels(ColourOf(kRed), 30, 0, 31, kHeight));
-}
-
-TEST_F(DrawingTest, SlantedLineOverTheSameSpanIsNotClamped)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint a = At(30, -100), b = At(31, kHeight + 50);
-    m_surface->DrawLine(a, b, &m_red);
-    EndPass();
-    bool found = false;
-    for (const GdiCall& call : recorder.Of(GdiCall::PolyPolyline)) {
-        if (call.count != 1)
-            continue;
-        found = true;
-        EXPECT_EQ(kHeight + 100, call.points[0].y);
-        EXPECT_EQ(-50, call.points[1].y);
-    }
-    EXPECT_TRUE(found);
-}
-
-TEST_F(DrawingTest, ThickenedVerticalLineGainsColumnsToTheRight)
-{
-    m_surface->SetThickenVertLine(2);
-    Tavo_GrDPoint a = At(10, 20), b = At(10, 60);
-    m_surface->DrawLine(a, b, &m_red);
-    Tavo_GrDPoint c = At(50, 80), d = At(90, 80);
-    m_surface->DrawLine(c, d, &m_red);
-    EndPass();
-    for (int x : {10, 11, 12})
-        EXPECT_EQ(40, m_canvas.CountPixels(ColourOf(kRed), x, 0, x + 1, kHeight)) << "column " << x;
-    EXPECT_EQ(0, m_canvas.CountPixels(ColourOf(kRed), 13, 0, 14, kHeight));
-    EXPECT_EQ(0, m_canvas.CountPixels(ColourOf(kRed), 9, 0, 10, kHeight));
-    EXPECT_EQ(40, m_canvas.CountPixels(ColourOf(kRed), 0, 0, kWidth, kHeight - 79)) << "horizontal stays one row";
-    EXPECT_EQ(4u, Stats().Get(Tavo_GrSurfaceStats::Lines));
-}
-
-TEST_F(DrawingTest, ThickeningNeedsAPositiveGate)
-{
-    m_surface->SetThickenVertLine(2);
-    m_surface->SetThickenGate(0.0);
-    Tavo_GrDPoint a = At(10, 20), b = At(10, 60);
-    m_surface->DrawLine(a, b, &m_red);
-    EndPass();
-    EXPECT_EQ(40, CountColour(kRed));
-}
-
-TEST_F(DrawingTest, ThickeningFromTheEnvironmentWidensVerticalLines)
-{
-    {
-        ScopedEnvironment thicken("BRY_VWR_THICKENVERTICALLINE", "2");
-        CreateSurface();
-    }
-    Tavo_GrDPoint a = At(10, 20), b = At(10, 60);
-    m_surface->DrawLine(a, b, &m_red);
-    EndPass();
-    EXPECT_EQ(120, CountColour(kRed));
-}
-
-TEST_F(DrawingTest, PolylineDrawsEachSegment)
-{
-    Tavo_GrDPoint points[3] = {At(10, 20), At(30, 20), At(30, 50)};
-    m_surface->DrawPline(3, points, &m_red);
-    EndPass();
-    EXPECT_TRUE(IsColour(10, kHeight - 20, kRed));
-    EXPECT_TRUE(IsColour(30, kHeight - 40, kRed));
-    EXPECT_EQ(2u, Stats().Get(Tavo_GrSurfaceStats::Lines));
-}
-
-TEST_F(DrawingTest, PolylineOfFewerThanTwoPointsDrawsNothing)
-{
-    Tavo_GrDPoint points[1] = {At(10, 20)};
-    m_surface->DrawPline(1, points, &m_red);
-    m_surface->DrawPline(0, points, &m_red);
-    m_surface->DrawPline(-3, points, &m_red);
-    m_surface->DrawPline(3, nullptr, &m_red);
-    EndPass();
-    EXPECT_EQ(0, CountColour(kRed));
-    EXPECT_EQ(0u, Stats().Get(Tavo_GrSurfaceStats::Lines));
-}
-
-// ---- Rectangles -------------------------------------------------------------------
-
-// Wine's DIB engine draws nothing for a Rectangle one pixel wide and one high
-// (Windows draws the pixel), so the one-pixel case is checked on the call and
-// the pixels on the thinnest rectangles that both draw.
-TEST_F(DrawingTest, DegenerateFilledRectangleIsARectangleCallCoveringOnePixel)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDRect r{40, 40, 40, 40};
-    m_surface->DrawRect(r, &m_redFilled);
-    EndPass();
-    const std::vector<GdiCall> rects = recorder.Of(GdiCall::Rectangle);
-    ASSERT_EQ(1u, rects.size());
-    EXPECT_EQ(40, rects[0].values[0]);
-    EXPECT_EQ(kHeight - 40, rects[0].values[1]);
-    EXPECT_EQ(41, rects[0].values[2]);
-    EXPECT_EQ(kHeight - 40 + 1, rects[0].values[3]);
-}
-
-TEST_F(DrawingTest, OneColumnAndOneRowRectanglesCoverExactlyTheirPixels)
-{
-    Tavo_GrDRect column{40, 40, 40, 41};
-    Tavo_GrDRect row{60, 40, 61, 40};
+    Tavo_GrDRect filled{10, 20, 29, 34}, column{40, 40, 40, 41}, row{60, 40, 61, 40};
+    m_surface->DrawRect(filled, &m_redFilled);
     m_surface->DrawRect(column, &m_redFilled);
     m_surface->DrawRect(row, &m_redFilled);
     EndPass();
-    EXPECT_EQ(4, CountColour(kRed));
-    EXPECT_TRUE(IsColour(40, kHeight - 40, kRed));
-    EXPECT_TRUE(IsColour(40, kHeight - 41, kRed));
-    EXPECT_TRUE(IsColour(60, kHeight - 40, kRed));
-    EXPECT_TRUE(IsColour(61, kHeight - 40, kRed));
+    EXPECT_EQ(20 * 15, RedIn(10, kHeight - 34, 30, kHeight - 19));
+    EXPECT_EQ(2, RedIn(40, kHeight - 41, 41, kHeight - 39));
+    EXPECT_EQ(2, RedIn(60, kHeight - 40, 62, kHeight - 39));
+    EXPECT_EQ(20 * 15 + 2 + 2, CountColour(kRed));
+
+    m_canvas.Fill(RGB(255, 255, 255));
+    CreateSurface();
+    m_surface->DrawRect(filled, &m_red);
+    EndPass();
+    EXPECT_EQ(2 * 21 + 2 * 14, CountColour(kRed)) << "outline through (l, t) .. (r + 1, b + 1)";
+    EXPECT_FALSE(IsColour(20, kHeight - 27, kRed)) << "inside stays empty";
 }
 
-TEST_F(DrawingTest, FilledRectangleIncludesBothEdges)
+// Wine's DIB engine draws nothing for a Rectangle one pixel wide and one high
+// (Windows draws the pixel), so the one-pixel rectangle is checked on the call.
+TEST_F(DrawingTest, DegenerateFilledRectangleIsARectangleCallCoveringOnePixel)
 {
-    Tavo_GrDRect r{10, 20, 29, 34};
+    Tavo_GrDRect r{40, 40, 40, 40};
     m_surface->DrawRect(r, &m_redFilled);
     EndPass();
-    EXPECT_EQ(20 * 15, CountColour(kRed));
-    EXPECT_TRUE(IsColour(10, kHeight - 20, kRed));
-    EXPECT_TRUE(IsColour(29, kHeight - 34, kRed));
+    const std::vector<GdiCall> rects = m_recorder->Of(GdiCall::Rectangle);
+    ASSERT_EQ(1u, rects.size());
+    EXPECT_EQ((std::array<int, 4>{40, kHeight - 40, 41, kHeight - 40 + 1}), rects[0].box);
 }
 
-TEST_F(DrawingTest, HollowRectangleOutlinesTheSamePixelsAsTheFilledOneBorders)
+TEST_F(DrawingTest, VerticalLinesBeyondTheSurfaceAreClampedSlantedOnesAreNot)
 {
-    Tavo_GrDRect r{10, 20, 29, 34};
-    m_surface->DrawRect(r, &m_red);
+    Tavo_GrDPoint a = At(30, -100), b = At(30, kHeight + 50), c = At(31, kHeight + 50);
+    m_surface->DrawLine(a, b, &m_red);
+    m_surface->DrawLine(a, c, &m_red);
     EndPass();
-    EXPECT_TRUE(IsColour(10, kHeight - 34, kRed));
-    EXPECT_FALSE(IsColour(20, kHeight - 27, kRed)) << "inside stays empty";
-    EXPECT_EQ(2 * 21 + 2 * 14, CountColour(kRed)) << "outline through (l,t) .. (r+1,b+1)";
+    std::vector<GdiCall> lines = m_recorder->Of(GdiCall::PolyPolyline);
+    lines.erase(std::remove_if(lines.begin(), lines.end(), [](const GdiCall& call) { return call.count == 0; }),
+                lines.end());
+    ASSERT_EQ(1u, lines.size());
+    EXPECT_EQ((std::vector<POINT>{{30, kHeight}, {30, -1}, {30, kHeight + 100}, {31, -50}}), lines[0].points);
+    EXPECT_EQ(kHeight, RedIn(30, 0, 31, kHeight)) << "the clamped line still covers the column";
 }
 
-// ---- Circles and triangles ---------------------------------------------------------
-
-TEST_F(DrawingTest, CircleWithoutRadiusIsOneDot)
+TEST_F(DrawingTest, ThickeningWidensVerticalLinesToTheRightOnly)
 {
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint c = At(50, 50);
-    m_surface->DrawCircle(c, 0, &m_red);
-    Tavo_GrDPoint d = At(70, 50);
-    m_surface->DrawCircle(d, -5, &m_red);
-    EndPass();
-    EXPECT_EQ(2, CountColour(kRed));
-    EXPECT_TRUE(IsColour(70, kHeight - 50, kRed));
-    EXPECT_EQ(2u, Stats().Get(Tavo_GrSurfaceStats::Dots));
-}
-
-TEST_F(DrawingTest, CircleDotDoesNotTakePartInRepeatSuppression)
-{
-    Tavo_GrDPoint c = At(50, 50);
-    m_surface->DrawCircle(c, 0, &m_red);
-    m_surface->DrawDot(c, &m_red);
-    EndPass();
-    EXPECT_EQ(2u, Stats().Get(Tavo_GrSurfaceStats::Dots));
-}
-
-TEST_F(DrawingTest, SmallCircleIsAnOutlinedTriangleWhateverTheFill)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint c = At(50, 50);
-    m_surface->DrawCircle(c, 2, &m_redFilled);
-    EndPass();
-    EXPECT_EQ(1u, Stats().Get(Tavo_GrSurfaceStats::HollowTriangles));
-    EXPECT_EQ(0u, Stats().Get(Tavo_GrSurfaceStats::Circles));
-    const int y = kHeight - 50;
-    bool found = false;
-    for (const GdiCall& call : recorder.Of(GdiCall::PolyPolyline)) {
-        if (call.count != 1)
-            continue;
-        found = true;
-        ASSERT_EQ(4u, call.points.size());
-        EXPECT_EQ(48, call.points[0].x);
-        EXPECT_EQ(y + 2, call.points[0].y);
-        EXPECT_EQ(52, call.points[1].x);
-        EXPECT_EQ(y + 2, call.points[1].y);
-        EXPECT_EQ(50, call.points[2].x);
-        EXPECT_EQ(y - 2, call.points[2].y);
+    struct Case {
+        const char* environment; // BRY_VWR_THICKENVERTICALLINE
+        int thicken;             // given to SetThickenVertLine, 0: not called
+        bool gateClosed;         // a thickening gate of 0
+        int columns;
+    };
+    const Case cases[] = {{nullptr, 2, false, 3}, {"2", 0, false, 3}, {nullptr, 2, true, 1}};
+    for (const Case& c : cases) {
+        SCOPED_TRACE(testing::Message() << (c.environment ? c.environment : "unset") << ", " << c.thicken << ", gate "
+                                        << (c.gateClosed ? "0" : "default"));
+        m_canvas.Fill(RGB(255, 255, 255));
+        {
+            ScopedEnvironment thicken("BRY_VWR_THICKENVERTICALLINE", c.environment);
+            CreateSurface();
+        }
+        if (c.thicken)
+            m_surface->SetThickenVertLine(c.thicken);
+        if (c.gateClosed)
+            m_surface->SetThickenGate(0.0);
+        Tavo_GrDPoint a = At(10, 20), b = At(10, 60), d = At(50, 80), e = At(90, 80);
+        m_surface->DrawLine(a, b, &m_red);
+        m_surface->DrawLine(d, e, &m_red);
+        EndPass();
+        for (int x = 9; x <= 13; ++x)
+            EXPECT_EQ(x >= 10 && x < 10 + c.columns ? 40 : 0, RedIn(x, 0, x + 1, kHeight)) << "column " << x;
+        EXPECT_EQ(40, RedIn(0, kHeight - 80, kWidth, kHeight - 79)) << "the horizontal line stays one row";
     }
-    EXPECT_TRUE(found);
 }
 
-TEST_F(DrawingTest, FilledCircleIsFilledInItsOutlineColour)
+TEST_F(DrawingTest, BadInputDrawsNothing)
 {
-    Tavo_GrDPoint c = At(60, 60);
-    m_surface->DrawCircle(c, 3, &m_redFilled);
-    Tavo_GrDPoint d = At(150, 60);
-    m_surface->DrawCircle(d, 20, &m_redFilled);
-    EndPass();
-    EXPECT_EQ(2u, Stats().Get(Tavo_GrSurfaceStats::Circles));
-    EXPECT_TRUE(IsColour(150, kHeight - 60, kRed));
-    EXPECT_TRUE(IsColour(60, kHeight - 60, kRed));
-}
-
-TEST_F(DrawingTest, HollowCircleLeavesItsInsideEmpty)
-{
-    Tavo_GrDPoint c = At(100, 60);
-    m_surface->DrawCircle(c, 20, &m_red);
-    EndPass();
-    EXPECT_FALSE(IsColour(100, kHeight - 60, kRed));
-    EXPECT_TRUE(IsColour(80, kHeight - 60, kRed));
-    EXPECT_GT(CountColour(kRed), 80);
-}
-
-TEST_F(DrawingTest, TinyOutlinedTriangleIsAnOpenUniangle)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint points[3] = {At(10, 10), At(14, 6), At(6, 14)};
-    m_surface->DrawTriangle(points, &m_red);
-    EndPass();
-    EXPECT_EQ(1u, Stats().Get(Tavo_GrSurfaceStats::Lines));
-    EXPECT_EQ(0u, Stats().Get(Tavo_GrSurfaceStats::HollowTriangles));
-}
-
-TEST_F(DrawingTest, TriangleWithAFarPointIsClosed)
-{
-    Tavo_GrDPoint points[3] = {At(10, 10), At(15, 10), At(6, 14)};
-    m_surface->DrawTriangle(points, &m_red);
-    EndPass();
-    EXPECT_EQ(0u, Stats().Get(Tavo_GrSurfaceStats::Lines));
-    EXPECT_EQ(1u, Stats().Get(Tavo_GrSurfaceStats::HollowTriangles));
-}
-
-TEST_F(DrawingTest, FilledTriangleIsFilled)
-{
-    Tavo_GrDPoint points[3] = {At(20, 20), At(120, 20), At(70, 120)};
-    m_surface->DrawTriangle(points, &m_redFilled);
-    EndPass();
-    EXPECT_TRUE(IsColour(70, kHeight - 50, kRed));
-    EXPECT_FALSE(IsColour(25, kHeight - 110, kRed));
-    EXPECT_EQ(1u, Stats().Get(Tavo_GrSurfaceStats::FilledTriangles));
-}
-
-TEST_F(DrawingTest, GridChangesNothingNotEvenTheAttribute)
-{
-    GdiCallRecorder recorder;
-    Tavo_GrDPoint a = At(0, 0), b = At(10, 10), c = At(100, 100);
-    m_surface->DrawGrid(a, b, c, &m_red);
-    EXPECT_TRUE(recorder.GetCalls().empty());
+    Tavo_GrDPoint points[1] = {At(10, 20)};
+    m_surface->DrawPline(1, points, &m_red);
+    m_surface->DrawPline(-3, points, &m_red);
+    m_surface->DrawPline(3, nullptr, &m_red);
+    Tavo_GrDRect box{10, 10, 100, 100};
+    Tavo_GrAttr text = Outline(kRed, 20);
+    m_surface->DrawText(nullptr, box, &text, 20);
+    m_surface->DrawText("", box, &text, 20);
     EndPass();
     EXPECT_EQ(0, CountColour(kRed));
-    EXPECT_EQ(0u, Stats().Get(Tavo_GrSurfaceStats::AttrChanges));
 }
-
-#pragma pop_macro("DrawText")

@@ -1,6 +1,5 @@
 // Shared set-up of the surface tests: a white 32-bit canvas, a surface bound
-// to it with the device height of the canvas and a scale of 1, and helpers to
-// name colours and run a pass.
+// to it (device height of the canvas, scale 1) and its GDI calls recorded.
 #pragma once
 
 #include "DibCanvas.h"
@@ -8,45 +7,62 @@
 
 #include "Tavo_GrAttr.h"
 #include "Tavo_GrTransform.h"
+#include "Tavo_WiLibrary.h"
+#include "Tavo_WiPalette.h"
 #include "Tavo_WiWin32Surface.h"
 
 #include <gtest/gtest.h>
 
 #include <memory>
-#include <string>
+#include <ostream>
 
-#pragma push_macro("DrawText")
+// The tests call the surface's DrawText, never the Win32 macro of that name.
 #undef DrawText
 
-// Built-in palette indices used by the tests.
-enum TestColour : char {
-    kBlack = 0,
-    kBlue = 1,
-    kGreen = 2,
-    kRed = 4,
-    kWhite = 7,
-};
+enum TestColour : char { kBlack = 0, kBlue = 1, kRed = 4 };
 
 // The COLORREF the surface draws a palette index with.
-COLORREF ColourOf(char index);
+inline COLORREF ColourOf(char index)
+{
+    return Tavo_WiLibrary::GetPalette()->GetWin32Color(index, false);
+}
 
-// An attribute: outlines only (fill 0) or filled (fill 1).
-Tavo_GrAttr Outline(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault);
-Tavo_GrAttr Filled(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault);
+inline Tavo_GrAttr Outline(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault)
+{
+    return Tavo_GrAttr(colour, 0, charHeight, align);
+}
 
-// Sets an environment variable while it lives (null value: unset), restoring
-// the previous state afterwards.
+inline Tavo_GrAttr Filled(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault)
+{
+    return Tavo_GrAttr(colour, 1, charHeight, align);
+}
+
+inline Tavo_GrDPoint At(int x, int y)
+{
+    return Tavo_GrDPoint{x, y};
+}
+
+// POINT is a global type: its comparison and printing must be found there.
+inline bool operator==(const POINT& a, const POINT& b)
+{
+    return a.x == b.x && a.y == b.y;
+}
+
+inline void PrintTo(const POINT& point, std::ostream* out)
+{
+    *out << "(" << point.x << ", " << point.y << ")";
+}
+
+// Sets an environment variable (null: unset) while it lives, then unsets it.
 class ScopedEnvironment {
 public:
-    ScopedEnvironment(const char* name, const char* value);
-    ~ScopedEnvironment();
+    ScopedEnvironment(const char* name, const char* value) : m_name(name) { SetEnvironmentVariableA(name, value); }
+    ~ScopedEnvironment() { SetEnvironmentVariableA(m_name, nullptr); }
     ScopedEnvironment(const ScopedEnvironment&) = delete;
     ScopedEnvironment& operator=(const ScopedEnvironment&) = delete;
 
 private:
-    std::string m_name;
-    std::string m_previous;
-    bool m_wasSet = false;
+    const char* m_name;
 };
 
 class SurfaceTest : public ::testing::Test {
@@ -54,31 +70,45 @@ protected:
     static constexpr int kWidth = 240;
     static constexpr int kHeight = 160;
 
-    void SetUp() override;
-    void TearDown() override;
+    void SetUp() override
+    {
+        ASSERT_TRUE(m_canvas.IsValid());
+        CreateSurface();
+        m_recorder = std::make_unique<GdiCallRecorder>();
+        ASSERT_TRUE(m_recorder->IsActive());
+    }
 
-    // Builds the surface now (after a test has set its environment) and binds it.
-    void CreateSurface();
-    // SetDC, device height, scale and the start of a pass.
-    void Bind(double scale = 1.0);
-    // Flush and EndDrawing.
-    void EndPass();
+    // A new surface, reading the environment now.
+    void CreateSurface()
+    {
+        m_surface = std::make_unique<Tavo_WiWin32Surface>();
+        Bind();
+    }
+
+    void Bind(double scale = 1.0)
+    {
+        m_surface->SetDC(m_canvas.GetDC());
+        m_surface->SetDeviceHeight(kHeight);
+        m_surface->SetTransform(Tavo_GrTransform(scale, 0.0, 0.0));
+        m_surface->BeginDrawing(nullptr);
+    }
+
+    void EndPass()
+    {
+        m_surface->Flush();
+        m_surface->EndDrawing();
+    }
 
     int CountColour(char colour) const { return m_canvas.CountPixels(ColourOf(colour)); }
     bool IsColour(int x, int y, char colour) const { return m_canvas.GetPixel(x, y) == ColourOf(colour); }
-    Tavo_GrSurfaceStats Stats() const;
+    unsigned Stat(Tavo_GrSurfaceStats::Counter counter) const
+    {
+        Tavo_GrSurfaceStats stats;
+        m_surface->FetchStats(stats);
+        return stats.Get(counter);
+    }
 
     DibCanvas m_canvas{kWidth, kHeight};
     std::unique_ptr<Tavo_WiWin32Surface> m_surface;
+    std::unique_ptr<GdiCallRecorder> m_recorder; // every GDI call of the surface
 };
-
-// The same with every GDI call of the surface recorded.
-class RecordedSurfaceTest : public SurfaceTest {
-protected:
-    void SetUp() override;
-    void TearDown() override;
-
-    std::unique_ptr<GdiCallRecorder> m_recorder;
-};
-
-#pragma pop_macro("DrawText")

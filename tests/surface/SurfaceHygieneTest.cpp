@@ -6,116 +6,70 @@
 #include "Tavo_GrDrawingBuilder.h"
 #include "Tavo_GrMapping.h"
 
-#pragma push_macro("DrawText")
-#undef DrawText
-
 namespace {
 
-struct DcObjects {
-    HGDIOBJ pen;
-    HGDIOBJ brush;
-    HGDIOBJ font;
-};
-
-DcObjects CurrentObjects(HDC dc)
+std::vector<HGDIOBJ> CurrentObjects(HDC dc)
 {
     return {GetCurrentObject(dc, OBJ_PEN), GetCurrentObject(dc, OBJ_BRUSH), GetCurrentObject(dc, OBJ_FONT)};
 }
 
-std::vector<HGDIOBJ> CreatedObjects(const GdiCallRecorder& recorder)
-{
-    std::vector<HGDIOBJ> objects;
-    for (const GdiCall& call : recorder.GetCalls())
-        if (call.kind == GdiCall::CreatePen || call.kind == GdiCall::CreateBrush || call.kind == GdiCall::CreateFont)
-            objects.push_back(call.object);
-    return objects;
-}
-
-// A small drawing with several colours, fills and text.
-void BuildDrawing(Tavo_GrDrawing& drawing)
-{
-    Tavo_GrDrawingBuilder build(drawing);
-    build.SetAttr(Tavo_GrAttr(4, 1, 12));
-    build.AddRect(0, 0, 200, 100);
-    build.AddText(10, 50, "text");
-    build.SetAttr(Tavo_GrAttr(1, 0, 30));
-    build.AddCircle(50, 50, 20);
-    build.AddLine(0, 0, 200, 100);
-    build.AddText(60, 20, "more text");
-    build.SetAttr(Tavo_GrAttr(2, 1, 1));
-    build.AddTriangle({10, 10}, {30, 10}, {20, 30});
-    build.AddText(100, 20, "tiny");
-}
-
 } // namespace
 
-TEST_F(RecordedSurfaceTest, EndDrawingRestoresTheDcAndDeletesWhatTheSurfaceMade)
+TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
 {
-    const DcObjects before = CurrentObjects(m_canvas.GetDC());
-    Tavo_GrAttr attr = Filled(kRed, 20);
-    Tavo_GrDRect r{10, 10, 50, 50};
-    Tavo_GrDPoint p{10, 80};
-    m_surface->DrawRect(r, &attr);
-    m_surface->DrawText("text", p, &attr);
-    EndPass();
+    const std::vector<HGDIOBJ> before = CurrentObjects(m_canvas.GetDC());
+    for (const bool endDrawing : {true, false}) {
+        SCOPED_TRACE(endDrawing ? "EndDrawing" : "surface destroyed in the middle of a pass");
+        CreateSurface();
+        m_recorder->Clear();
+        Tavo_GrAttr attr = Filled(kRed, 20);
+        Tavo_GrDRect r{10, 10, 50, 50};
+        Tavo_GrDPoint p{10, 80};
+        m_surface->DrawRect(r, &attr);
+        m_surface->DrawText("text", p, &attr);
+        if (endDrawing)
+            EndPass();
+        else
+            m_surface.reset();
 
-    const DcObjects after = CurrentObjects(m_canvas.GetDC());
-    EXPECT_EQ(before.pen, after.pen);
-    EXPECT_EQ(before.brush, after.brush);
-    EXPECT_EQ(before.font, after.font);
-    const std::vector<HGDIOBJ> created = CreatedObjects(*m_recorder);
-    EXPECT_EQ(3u, created.size());
-    for (HGDIOBJ object : created)
-        EXPECT_EQ(0u, GetObjectType(object)) << "deleted";
-    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
-}
-
-TEST_F(RecordedSurfaceTest, SurfaceHoldsNothingBetweenPasses)
-{
+        EXPECT_EQ(before, CurrentObjects(m_canvas.GetDC()));
+        int created = 0;
+        for (const GdiCall& call : m_recorder->GetCalls()) {
+            if (call.kind == GdiCall::CreatePen || call.kind == GdiCall::CreateBrush || call.kind == GdiCall::CreateFont) {
+                ++created;
+                EXPECT_EQ(0u, GetObjectType(call.object)) << "deleted";
+            }
+        }
+        EXPECT_EQ(3, created) << "pen, brush and font";
+        EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
+    }
+    // After EndDrawing the surface holds nothing: its destructor releases nothing.
+    CreateSurface();
     Tavo_GrAttr attr = Filled(kRed, 20);
-    Tavo_GrDRect r{10, 10, 50, 50};
-    m_surface->DrawRect(r, &attr);
+    m_surface->SetCurrentAttr(&attr);
     EndPass();
     m_recorder->Clear();
-    m_surface.reset(); // the destructor finds nothing left to release
-    EXPECT_EQ(0, m_recorder->CountOf(GdiCall::DeleteObject));
-    EXPECT_EQ(0, m_recorder->CountOf(GdiCall::SelectObject));
-}
-
-TEST_F(RecordedSurfaceTest, SurfaceDestroyedInTheMiddleOfAPassLeaksNothing)
-{
-    const DcObjects before = CurrentObjects(m_canvas.GetDC());
-    Tavo_GrAttr attr = Filled(kRed, 20);
-    Tavo_GrDRect r{10, 10, 50, 50};
-    m_surface->DrawRect(r, &attr);
     m_surface.reset();
-    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
-    const DcObjects after = CurrentObjects(m_canvas.GetDC());
-    EXPECT_EQ(before.pen, after.pen);
-    EXPECT_EQ(before.brush, after.brush);
-    EXPECT_EQ(before.font, after.font);
+    EXPECT_TRUE(m_recorder->GetCalls().empty());
 }
 
-TEST_F(RecordedSurfaceTest, SurfaceWithoutADeviceContextDrawsNothingAndLeaksNothing)
+TEST_F(SurfaceTest, TenThousandPassesThroughTheCoreLeakNoGdiObject)
 {
-    m_surface->SetDC(nullptr);
-    Tavo_GrAttr attr = Filled(kRed, 20);
-    Tavo_GrDRect r{10, 10, 50, 50};
-    Tavo_GrDPoint p{10, 80};
-    m_surface->DrawRect(r, &attr);
-    m_surface->DrawText("text", p, &attr);
-    EndPass();
-    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
-    EXPECT_EQ(0, CountColour(kRed));
-}
-
-TEST_F(RecordedSurfaceTest, TenThousandPassesThroughTheCoreLeakNoGdiObject)
-{
+    // Several colours, fills and text heights, so that every pass makes and drops objects.
     Tavo_GrDrawing drawing;
-    BuildDrawing(drawing);
+    Tavo_GrDrawingBuilder build(drawing);
+    build.SetAttr(Tavo_GrAttr(kRed, 1, 12));
+    build.AddRect(0, 0, 200, 100);
+    build.AddText(10, 50, "text");
+    build.SetAttr(Tavo_GrAttr(kBlue, 0, 30));
+    build.AddCircle(50, 50, 20);
+    build.AddText(60, 20, "more text");
+    build.SetAttr(Tavo_GrAttr(kBlack, 1, 1));
+    build.AddTriangle({10, 10}, {30, 10}, {20, 30});
+    build.AddText(100, 20, "tiny");
     Tavo_GrMapping mapping(&drawing, 5);
     mapping.SetDeviceWindowSize(kWidth, kHeight, true, nullptr);
-    const DcObjects before = CurrentObjects(m_canvas.GetDC());
+    const std::vector<HGDIOBJ> before = CurrentObjects(m_canvas.GetDC());
     m_recorder->SetKeepCalls(false);
 
     for (int pass = 0; pass < 10000; ++pass) {
@@ -125,11 +79,13 @@ TEST_F(RecordedSurfaceTest, TenThousandPassesThroughTheCoreLeakNoGdiObject)
 
     EXPECT_GE(m_recorder->GetCreatedCount(), 10000 * 5);
     EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
-    const DcObjects after = CurrentObjects(m_canvas.GetDC());
-    EXPECT_EQ(before.pen, after.pen);
-    EXPECT_EQ(before.brush, after.brush);
-    EXPECT_EQ(before.font, after.font);
+    EXPECT_EQ(before, CurrentObjects(m_canvas.GetDC()));
     EXPECT_GT(CountColour(kRed), 1000) << "the passes did draw";
-}
 
-#pragma pop_macro("DrawText")
+    // Without a device context nothing is drawn and nothing is kept either.
+    m_canvas.Fill(RGB(255, 255, 255));
+    m_surface->SetDC(nullptr);
+    drawing.Draw(*m_surface, mapping, nullptr);
+    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
+    EXPECT_EQ(0, CountColour(kRed));
+}

@@ -69,11 +69,3 @@ void ImportPatch::Write(void** address, void* value)
     *address = value;
     VirtualProtect(address, sizeof(void*), protection, &protection);
 }
-
-HMODULE ModuleOf(const void* address)
-{
-    HMODULE module = nullptr;
-    GetModuleHandleExA(GET_MODULE_HANDLE_EX_FLAG_FROM_ADDRESS | GET_MODULE_HANDLE_EX_FLAG_UNCHANGED_REFCOUNT,
-                       static_cast<const char*>(address), &module);
-    return module;
-}

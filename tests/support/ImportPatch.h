@@ -34,6 +34,3 @@ private:
     std::vector<Slot> m_slots;
     void* m_original = nullptr;
 };
-
-// The module that holds `address` (for example a function of a DLL).
-HMODULE ModuleOf(const void* address);
