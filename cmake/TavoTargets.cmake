@@ -17,4 +17,6 @@ function(tavo_test name)
   tavo_warnings(${name})
   target_link_libraries(${name} PRIVATE ${ARG_LIBRARIES} GTest::gtest_main)
   add_test(NAME ${name} COMMAND ${name} --gtest_color=no)
+  # The Wine runner needs these to start the keeper and register the printer.
+  add_dependencies(${name} wine_keeper wine_printer_setup)
 endfunction()

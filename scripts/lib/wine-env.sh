@@ -94,8 +94,16 @@ tavo_start_keeper() {
     tavo_pid_alive "$TAVO_WINE/keeper.pid" && return 0
     local keeper="$TAVO_BUILD/bin/wine_keeper.exe"
     [ -f "$keeper" ] || return 0
-    setsid wine "$keeper" </dev/null >"$TAVO_WINE/log/keeper.log" 2>&1 &
+    local ready="$TAVO_WINE/keeper.ready"
+    rm -f "$ready"
+    setsid wine "$keeper" "$(tavo_windows_path "$ready")" </dev/null >"$TAVO_WINE/log/keeper.log" 2>&1 &
     echo $! >"$TAVO_WINE/keeper.pid"
+    # The keeper must be the program that starts Wine's services (they keep
+    # the streams of whoever starts them); wait until it is up.
+    if ! tavo_wait_for 60 test -e "$ready"; then
+        tavo_wine_say "the keeper program did not start; see $TAVO_WINE/log/keeper.log"
+        return 1
+    fi
 }
 
 # tavo_wine_up: make the environment ready; idempotent and cheap when it is.
@@ -112,6 +120,10 @@ tavo_wine_up() {
 tavo_wine_down() {
     if [ -d "$WINEPREFIX" ]; then
         wineserver -k </dev/null >/dev/null 2>&1 || true
+        # Wait until the server has really gone: a program started while it
+        # is still exiting would start a new, non-persistent server of its own
+        # that inherits the caller's streams and outlives it.
+        wineserver -w </dev/null >/dev/null 2>&1 || true
     fi
     rm -f "$TAVO_WINE/keeper.pid"
     if tavo_pid_alive "$TAVO_WINE/xvfb.pid"; then
