@@ -4,9 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <string>
-#include <type_traits>
-
 namespace {
 
 struct BuiltIn {
@@ -24,17 +21,12 @@ const BuiltIn kBuiltIns[16] = {
     {"olive", 0x286450, 7},
 };
 
-DWORD Grey(int level)
-{
-    return static_cast<DWORD>(level) * 0x010101;
-}
-
 class PaletteTest : public ::testing::Test {
 protected:
     Tavo_WiPalette m_palette;
 };
 
-// ---- The built-in table ---------------------------------------------------------
+// ---- The built-in table and names ---------------------------------------------------
 
 TEST_F(PaletteTest, HoldsTheSixteenBuiltInColoursInOrder)
 {
@@ -45,60 +37,35 @@ TEST_F(PaletteTest, HoldsTheSixteenBuiltInColoursInOrder)
         EXPECT_STREQ(m_palette.GetColorUserName(static_cast<char>(i)), kBuiltIns[i].name);
         EXPECT_EQ(m_palette.GetWin32Color(static_cast<char>(i), false), kBuiltIns[i].rgb);
         EXPECT_EQ(m_palette.GetTextColor(i), kBuiltIns[i].textColor);
-        EXPECT_EQ(m_palette.GetMotifColor(static_cast<char>(i)), 0u);
     }
+    EXPECT_TRUE(m_palette.GetColor(15, -3) == 15 && m_palette.GetColor(16, -3) == -3 && m_palette.GetColor(-1, 9) == 9);
+    EXPECT_TRUE(m_palette.GetTextColor(-5) == 0 && m_palette.GetTextColor(16) == 0) << "black outside the table";
 }
 
-TEST_F(PaletteTest, NamesItsClass)
+TEST_F(PaletteTest, UserNameLookups)
 {
-    EXPECT_STREQ(m_palette.GetClassName(), "Tavo_WiPalette");
-    EXPECT_EQ(m_palette.GetWin32Palette(), nullptr);
-}
-
-TEST_F(PaletteTest, GetColorAcceptsOnlyIndicesOfEntries)
-{
-    EXPECT_EQ(m_palette.GetColor(15, -3), 15);
-    EXPECT_EQ(m_palette.GetColor(16, -3), -3);
-    EXPECT_EQ(m_palette.GetColor(-1, 9), 9);
-}
-
-// ---- Names ------------------------------------------------------------------------
-
-TEST_F(PaletteTest, GreyInAnyCaseIsGray)
-{
-    EXPECT_EQ(m_palette.GetUserNamedColor("grey", -1), 8);
-    EXPECT_EQ(m_palette.GetUserNamedColor("Grey", -1), 8);
-    EXPECT_EQ(m_palette.GetUserNamedColor("GREY", -1), 8);
-}
-
-TEST_F(PaletteTest, SpecialNamesNeverReachTheTable)
-{
-    EXPECT_EQ(m_palette.GetUserNamedColor("DEFAULT", 0), -3);
-    EXPECT_EQ(m_palette.GetUserNamedColor("Inherit", 0), -2);
-    EXPECT_EQ(m_palette.GetUserNamedColor("transparent", 0), -1);
-}
-
-TEST_F(PaletteTest, UnknownAndNullNamesGiveTheCallersDefault)
-{
-    EXPECT_EQ(m_palette.GetUserNamedColor("mauve", 42), 42);
-    EXPECT_EQ(m_palette.GetUserNamedColor(nullptr, 42), 42);
-    EXPECT_EQ(m_palette.GetInternalNamedColor(nullptr, 42), 42);
-    EXPECT_EQ(m_palette.GetInternalNamedColor("grey", 42), 42) << "no synonyms for internal names";
+    const struct {
+        const char* name;
+        char index;
+    } rows[] = {
+        {"grey", 8}, {"Grey", 8}, {"GREY", 8}, {"Dark Red", 13},
+        // Special names never reach the table.
+        {"DEFAULT", -3}, {"Inherit", -2}, {"transparent", -1},
+        {"mauve", 42}, {nullptr, 42}, // the caller's default
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(m_palette.GetUserNamedColor(row.name, 42), row.index) << (row.name ? row.name : "(null)");
     EXPECT_EQ(m_palette.GetInternalNamedColor("Dark Red", 42), 13);
+    EXPECT_EQ(m_palette.GetInternalNamedColor("grey", 42), 42) << "no synonyms for internal names";
+    EXPECT_EQ(m_palette.GetInternalNamedColor(nullptr, 42), 42);
 }
 
-TEST_F(PaletteTest, SpecialIndicesHaveNames)
+TEST_F(PaletteTest, SpecialIndicesHaveNamesAndSixteenIsNoColorBesideTheEntrysInternalName)
 {
     EXPECT_STREQ(m_palette.GetColorUserName(-1), "transparent");
     EXPECT_STREQ(m_palette.GetColorUserName(-2), "inherit");
     EXPECT_STREQ(m_palette.GetColorUserName(-3), "default");
-    EXPECT_EQ(m_palette.GetColorUserName(-4), nullptr);
-    EXPECT_EQ(m_palette.GetColorName(-1), nullptr);
-    EXPECT_EQ(m_palette.GetColorName(16), nullptr);
-}
-
-TEST_F(PaletteTest, SixteenIsNoColorBesideTheEntrysInternalName)
-{
+    EXPECT_TRUE(!m_palette.GetColorUserName(-4) && !m_palette.GetColorName(-1) && !m_palette.GetColorName(16));
     EXPECT_STREQ(m_palette.GetColorUserName(16), "no color");
     ASSERT_EQ(m_palette.AddColor("coral", 255, 127, 80), 16);
     EXPECT_STREQ(m_palette.GetColorUserName(16), "no color");
@@ -107,53 +74,36 @@ TEST_F(PaletteTest, SixteenIsNoColorBesideTheEntrysInternalName)
 
 // ---- Colour values -----------------------------------------------------------------
 
-TEST_F(PaletteTest, IndicesOutOfRangeStandForWhite)
-{
-    EXPECT_EQ(m_palette.GetWin32Color(-1, false), 0x00FFFFFFu);
-    EXPECT_EQ(m_palette.GetWin32Color(100, false), 0x00FFFFFFu);
-    EXPECT_EQ(m_palette.GetWin32Index(-3), 0x00FFFFFFu);
-}
-
-TEST_F(PaletteTest, GrayWithAndWithoutGrey)
-{
-    EXPECT_EQ(m_palette.GetWin32Color(8, false), 0x00A4A0A0u);
-    EXPECT_EQ(m_palette.GetWin32Color(8, true), 0x00A0A0A0u);
-}
-
 TEST_F(PaletteTest, GreyIsTheTruncatedLuminance)
 {
-    EXPECT_EQ(m_palette.GetWin32Color(1, true), Grey(28));   // blue
-    EXPECT_EQ(m_palette.GetWin32Color(2, true), Grey(150));  // green
-    EXPECT_EQ(m_palette.GetWin32Color(4, true), Grey(76));   // red
-    EXPECT_EQ(m_palette.GetWin32Color(6, true), Grey(226));  // yellow
-    EXPECT_EQ(m_palette.GetWin32Color(7, true), Grey(255));  // white
-    EXPECT_EQ(m_palette.GetWin32Color(15, true), Grey(87));  // olive
-    EXPECT_EQ(m_palette.GetWin32Color(0, true), Grey(0));    // black
+    const struct {
+        char index;
+        int level;
+    } rows[] = {{0, 0}, {1, 28}, {2, 150}, {4, 76}, {6, 226}, {7, 255}, {8, 160}, {15, 87}};
+    for (const auto& row : rows)
+        EXPECT_EQ(m_palette.GetWin32Color(row.index, true), static_cast<DWORD>(row.level) * 0x010101u)
+            << "index " << int(row.index);
+    EXPECT_EQ(m_palette.GetWin32Color(8, false), 0x00A4A0A0u);
 }
 
-TEST_F(PaletteTest, Win32IndexIsTheRgbValueWithoutAWin32Palette)
+TEST_F(PaletteTest, Win32IndexIsTheRgbValueAndIndicesOutOfRangeStandForWhite)
 {
     EXPECT_EQ(m_palette.GetWin32Index(1), 0x00FF0000u);
     EXPECT_EQ(m_palette.GetWin32Index(9), 0x004B4B4Bu);
+    for (char outside : {-3, -1, 100})
+        EXPECT_TRUE(m_palette.GetWin32Index(outside) == 0xFFFFFF && m_palette.GetWin32Color(outside, false) == 0xFFFFFF);
 }
 
 // ---- Adding colours ----------------------------------------------------------------
 
-TEST_F(PaletteTest, AddingAnExistingColourByValueFindsIt)
+TEST_F(PaletteTest, AddingByValueFindsAnExistingColourOrAppendsANewOne)
 {
     EXPECT_EQ(m_palette.AddColor("scarlet", 255, 0, 0), 4);
-    EXPECT_EQ(m_palette.GetColorCount(), 16);
     EXPECT_EQ(m_palette.GetUserNamedColor("scarlet", -99), -99) << "the name was not added";
-}
-
-TEST_F(PaletteTest, AddingANewColourByValueAppendsIt)
-{
     EXPECT_EQ(m_palette.AddColor("crimson", 200, 0, 0), 16);
     EXPECT_EQ(m_palette.GetColorCount(), 17);
-    EXPECT_EQ(m_palette.GetWin32Color(16, false), 0x000000C8u);
-    EXPECT_EQ(m_palette.GetTextColor(16), 0);
-    EXPECT_EQ(m_palette.GetUserNamedColor("Crimson", -1), 16);
-    EXPECT_EQ(m_palette.GetInternalNamedColor("crimson", -1), 16);
+    EXPECT_TRUE(m_palette.GetWin32Color(16, false) == 0x0000C8 && m_palette.GetTextColor(16) == 0);
+    EXPECT_TRUE(m_palette.GetUserNamedColor("Crimson", -1) == 16 && m_palette.GetInternalNamedColor("crimson", -1) == 16);
     EXPECT_EQ(m_palette.AddColor("again", 200, 0, 0), 16);
 }
 
@@ -161,25 +111,17 @@ TEST_F(PaletteTest, AddingAUserNameForAnInternalNameReturnsTheMatchedColour)
 {
     EXPECT_EQ(m_palette.AddColor("rouge", "red"), 4);
     ASSERT_EQ(m_palette.GetColorCount(), 17);
-    EXPECT_STREQ(m_palette.GetColorUserName(16), "no color");
     EXPECT_STREQ(m_palette.GetColorName(16), "red");
-    const char rouge = m_palette.GetUserNamedColor("rouge", -1);
-    EXPECT_EQ(rouge, 16);
-    EXPECT_EQ(m_palette.GetWin32Color(rouge, false), 0x000000FFu) << "the synonym draws in its colour";
-    EXPECT_EQ(m_palette.GetTextColor(rouge), 7);
+    EXPECT_EQ(m_palette.GetUserNamedColor("rouge", -1), 16);
+    EXPECT_EQ(m_palette.GetWin32Color(16, false), 0x000000FFu) << "the synonym draws in its colour";
+    EXPECT_EQ(m_palette.GetTextColor(16), 7);
 }
 
-TEST_F(PaletteTest, AddingAUserNameForAnUnknownInternalNameAddsNothing)
+TEST_F(PaletteTest, UnknownInternalNamesAndNullNamesAddNothing)
 {
-    EXPECT_EQ(m_palette.AddColor("rouge", "vermilion"), -99);
-    EXPECT_EQ(m_palette.GetColorCount(), 16);
-}
-
-TEST_F(PaletteTest, NullNamesAddNothing)
-{
-    EXPECT_EQ(m_palette.AddColor(nullptr, 1, 2, 3), -99);
-    EXPECT_EQ(m_palette.AddColor(nullptr, "red"), -99);
-    EXPECT_EQ(m_palette.AddColor("rouge", nullptr), -99);
+    for (int added : {m_palette.AddColor("rouge", "vermilion"), m_palette.AddColor(nullptr, 1, 2, 3),
+                      m_palette.AddColor(nullptr, "red"), m_palette.AddColor("rouge", nullptr)})
+        EXPECT_EQ(added, -99);
     EXPECT_EQ(m_palette.GetColorCount(), 16);
 }
 
@@ -192,30 +134,6 @@ TEST_F(PaletteTest, AFullTableAddsNothingAndNeverHandsOutANegativeIndex)
     EXPECT_EQ(m_palette.AddColor("synonym", "red"), -99);
     EXPECT_EQ(m_palette.GetColorCount(), 128);
     EXPECT_EQ(m_palette.AddColor("existing", 127, 1, 2), 127) << "existing colours are still found";
-}
-
-TEST_F(PaletteTest, TextColourOutsideTheTableIsBlack)
-{
-    EXPECT_EQ(m_palette.GetTextColor(0), 7);
-    EXPECT_EQ(m_palette.GetTextColor(2), 0);
-    EXPECT_EQ(m_palette.GetTextColor(-5), 0);
-    EXPECT_EQ(m_palette.GetTextColor(m_palette.GetColorCount()), 0);
-}
-
-TEST_F(PaletteTest, MotifAndWin32PaletteOperationsDoNothing)
-{
-    m_palette.CreateWin32Palette();
-    EXPECT_EQ(m_palette.GetWin32Palette(), nullptr);
-    EXPECT_FALSE(m_palette.DefineMotifColors(nullptr));
-    m_palette.DeleteMotifColormap();
-    m_palette.DeleteWin32Palette();
-    EXPECT_EQ(m_palette.GetMotifColor(3), 0u);
-}
-
-TEST(PaletteCopying, IsForbidden)
-{
-    EXPECT_FALSE(std::is_copy_constructible<Tavo_WiPalette>::value);
-    EXPECT_FALSE(std::is_copy_assignable<Tavo_WiPalette>::value);
 }
 
 TEST(PaletteEntry, CopiesOwnTheirNames)

@@ -6,7 +6,6 @@
 #include <gtest/gtest.h>
 
 #include <string>
-#include <vector>
 
 namespace {
 
@@ -20,24 +19,17 @@ std::string Text(const CString& value)
     return std::string(value.GetString(), value.GetLength());
 }
 
-TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimal)
+TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimalAndOtherPercentSignsStay)
 {
     EXPECT_EQ(Text((Gui_Msg(100, ThisProgram()) << 3 << -12).GetValue()), "Value 3 of -12");
-}
-
-TEST(MessageText, PercentSignsWithoutAnArgumentStayAsTheyAre)
-{
     EXPECT_EQ(Text((Gui_Msg(101, ThisProgram()) << 7).GetValue()), "100% sure, %3 stays, 77");
-}
-
-TEST(MessageText, TwoDigitsNameArgumentsTenAndAbove)
-{
-    Gui_Msg message(102, ThisProgram());
+    Gui_Msg twoDigits(102, ThisProgram());
     for (int i = 1; i <= 12; ++i)
-        message << i * 10;
-    EXPECT_EQ(Text(message.GetValue()), "120 and 10");
+        twoDigits << i * 10;
+    EXPECT_EQ(Text(twoDigits.GetValue()), "120 and 10");
 }
 
+// Message text never reaches a printf-style formatter.
 TEST(MessageText, ArgumentTextIsNeverFormattedAgain)
 {
     EXPECT_EQ(Gui_Msg::Substitute("%1%2", {"%2", "%s%n"}), "%2%s%n");
@@ -45,16 +37,11 @@ TEST(MessageText, ArgumentTextIsNeverFormattedAgain)
     EXPECT_EQ(Gui_Msg::Substitute("%0 %a %%1", {"x"}), "%0 %a %1");
 }
 
-TEST(MessageText, StringsOfLaterBlocksAreFound)
+TEST(MessageText, StringsOfLaterBlocksAreFoundAndAMissingStringGivesTheEmptyText)
 {
     std::string text;
     ASSERT_TRUE(Gui_Msg::LoadText(117, ThisProgram(), text));
     EXPECT_EQ(text, "block two");
-}
-
-TEST(MessageText, AMissingStringGivesTheEmptyText)
-{
-    std::string text;
     EXPECT_FALSE(Gui_Msg::LoadText(103, ThisProgram(), text));
     EXPECT_FALSE(Gui_Msg::LoadText(100, nullptr, text)) << "nothing registered yet";
     EXPECT_TRUE(Gui_Msg(4000, ThisProgram()).GetValue().IsEmpty());
@@ -71,13 +58,10 @@ TEST(MessageLookup, RegisteredModulesAreSearchedWhenNoModuleIsGiven)
     EXPECT_EQ(record.hResource, ThisProgram());
     EXPECT_EQ(Text((Gui_Msg(100) << 1 << 2).GetValue()), "Value 1 of 2");
     EXPECT_EQ(Gui_Locale::GetResourceModule(-1), nullptr);
-}
 
-TEST(MessageLookup, AResourceLibraryThatCannotBeLoadedFallsBackToTheInstance)
-{
-    AFX_EXTENSION_MODULE record = {};
-    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), "no-such-library.dll");
-    EXPECT_EQ(record.hResource, ThisProgram());
+    AFX_EXTENSION_MODULE other = {};
+    Gui_Locale::SetDllResourceHandle(other, ThisProgram(), "no-such-library.dll");
+    EXPECT_EQ(other.hResource, ThisProgram()) << "a resource library that cannot be loaded falls back to the instance";
 }
 
 } // namespace
