@@ -26,8 +26,8 @@ public:
     std::vector<Call> m_calls;
     int m_items = 0; // drawing operations received
     int m_attrChanges = 0;
-    int m_polls = 0;
-    int m_interruptAtPoll = 0; // PollDrawInterrupt reports an interrupt from this poll on (0: never)
+    int m_interruptAtPoll = 0;   // PollDrawInterrupt reports an interrupt from this poll on (0: never)
+    int m_interruptAfterItem = 0; // the surface sets the interrupted flag itself after this item (0: never)
 
     // The operations received, separated by spaces, leaving out those named skip.
     std::string Ops(const std::string& skip = "") const
@@ -37,13 +37,6 @@ public:
             if (call.op != skip)
                 ops += (ops.empty() ? "" : " ") + call.op;
         return ops;
-    }
-    int Count(const std::string& op) const
-    {
-        int n = 0;
-        for (const Call& call : m_calls)
-            n += call.op == op;
-        return n;
     }
 
     void DrawCircle(Tavo_GrDPoint& centre, int radius, Tavo_GrAttr* attr) override { Item(attr, "Circle", {centre}, radius); }
@@ -81,6 +74,8 @@ public:
     }
 
 private:
+    int m_polls = 0;
+
     void Note(const char* op)
     {
         m_calls.emplace_back();
@@ -99,6 +94,8 @@ private:
         call.hollow = IsHollow();
         call.scale = GetScale();
         call.deviceHeight = GetDeviceHeight();
+        if (m_items == m_interruptAfterItem)
+            SetDrawingInterruptedFlag();
     }
 };
 

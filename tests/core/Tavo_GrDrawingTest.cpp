@@ -104,7 +104,7 @@ TEST(DrawingPass, ItemsAreConvertedThroughTheTransform)
     EXPECT_EQ(calls[7].number, 14) << "font height: character height 7 at 2 pixels per unit";
 }
 
-TEST(DrawingModel, BoundsCoverEveryItemAndInvalidItemsAreRefused)
+TEST(DrawingModel, BoundsCoverEveryItemAndInvalidItemsAndCyclesAreRefused)
 {
     Tavo_GrDrawing drawing;
     Tavo_GrDrawingBuilder build(drawing);
@@ -163,7 +163,7 @@ TEST(DrawingCalls, NestedCallsAddTheirOffsetsUpToTheDepthLimit)
         if (depth <= Tavo_GrSurface::kMaxCallDepth)
             EXPECT_EQ(DotsDrawn(surface), (std::vector<Tavo_GrDPoint>{{depth, 0}}));
         else
-            EXPECT_EQ(surface.Count("Dot"), 0) << "nested deeper than the limit";
+            EXPECT_EQ(surface.m_items, 0) << "nested deeper than the limit";
     }
 }
 
@@ -297,17 +297,10 @@ TEST(DrawingInterrupt, AnInterruptStopsThePassButStillEndsTheLayerFlushesAndEnds
     EXPECT_EQ(surface.Ops("Dot"), "BeginDrawing BeginLayer EndLayer Flush EndDrawing");
     EXPECT_TRUE(surface.IsDrawingInterrupted());
 
-    // A flag set by the surface itself stops the pass at the next item.
-    struct StopAfterThird : RecordingSurface {
-        void DrawDot(Tavo_GrDPoint& p, Tavo_GrAttr* attr) override
-        {
-            RecordingSurface::DrawDot(p, attr);
-            if (m_items == 3)
-                SetDrawingInterruptedFlag();
-        }
-    } stopping;
+    RecordingSurface stopping;
+    stopping.m_interruptAfterItem = 3;
     drawing.Draw(stopping, mapping, nullptr);
-    EXPECT_EQ(stopping.m_items, 3);
+    EXPECT_EQ(stopping.m_items, 3) << "a flag set by the surface itself stops the pass at the next item";
 
     // The next pass starts with the flag cleared.
     surface.m_interruptAtPoll = 0;
