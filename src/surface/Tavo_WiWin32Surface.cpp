@@ -97,10 +97,12 @@ Tavo_WiWin32Surface::~Tavo_WiWin32Surface()
 
 void Tavo_WiWin32Surface::SetDC(HDC dc)
 {
-    // A surface whose last pass ended with EndDrawing holds no GDI object, so
-    // nothing is deleted here.
+    // A surface whose last pass ended with EndDrawing holds no GDI object and
+    // nothing is released here; one rebound in the middle of a pass gives the
+    // old device context its objects back and deletes its own, which would
+    // otherwise be lost.
+    ReleaseGdiObjects();
     m_hdc = dc;
-    ForgetGdiObjects();
     m_textAlign = 5; // left, bottom
     SetTextAlign(dc, TA_LEFT | TA_BOTTOM);
     SetBkMode(dc, TRANSPARENT);

@@ -18,8 +18,11 @@ std::vector<HGDIOBJ> CurrentObjects(HDC dc)
 TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
 {
     const std::vector<HGDIOBJ> before = CurrentObjects(m_canvas.GetDC());
-    for (const bool endDrawing : {true, false}) {
-        SCOPED_TRACE(endDrawing ? "EndDrawing" : "surface destroyed in the middle of a pass");
+    enum class Ending { EndDrawing, Destroyed, Rebound };
+    for (const Ending ending : {Ending::EndDrawing, Ending::Destroyed, Ending::Rebound}) {
+        SCOPED_TRACE(ending == Ending::EndDrawing ? "EndDrawing"
+                     : ending == Ending::Destroyed ? "surface destroyed in the middle of a pass"
+                                                   : "surface bound to another DC in the middle of a pass");
         CreateSurface();
         m_recorder->Clear();
         Tavo_GrAttr attr = Filled(kRed, 20);
@@ -27,10 +30,12 @@ TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
         Tavo_GrDPoint p{10, 80};
         m_surface->DrawRect(r, &attr);
         m_surface->DrawText("text", p, &attr);
-        if (endDrawing)
+        if (ending == Ending::EndDrawing)
             EndPass();
-        else
+        else if (ending == Ending::Destroyed)
             m_surface.reset();
+        else
+            m_surface->SetDC(nullptr);
 
         EXPECT_EQ(before, CurrentObjects(m_canvas.GetDC()));
         int created = 0;
