@@ -17,12 +17,6 @@ namespace {
 // sorting their numbers.
 constexpr size_t kMarkingShare = 16;
 
-int SaturatedAdd(int value, int delta)
-{
-    const long long sum = static_cast<long long>(value) + delta;
-    return static_cast<int>(std::clamp<long long>(sum, INT_MIN, INT_MAX));
-}
-
 // The device rectangle the pass covers, widened for pixels drawn beyond an
 // item's exact extent; false when the pass covers everything.
 bool PassArea(const Tavo_GrMapping& mapping, const Tavo_GrDRect* clip, Tavo_GrDRect& area)
@@ -36,8 +30,8 @@ bool PassArea(const Tavo_GrMapping& mapping, const Tavo_GrDRect* clip, Tavo_GrDR
         return false;
     }
     const int margin = Tavo_GrDrawing::kClipMarginPixels;
-    area = {SaturatedAdd(area.xmin, -margin), SaturatedAdd(area.ymin, -margin), SaturatedAdd(area.xmax, margin),
-            SaturatedAdd(area.ymax, margin)};
+    area = {Tavo_GrAdd(area.xmin, -margin), Tavo_GrAdd(area.ymin, -margin), Tavo_GrAdd(area.xmax, margin),
+            Tavo_GrAdd(area.ymax, margin)};
     return true;
 }
 

@@ -5,24 +5,9 @@
 #include "Tavo_GrDrawing.h"
 #include "Tavo_GrPolygonFill.h"
 
-#include <climits>
+#include "Tavo_GrRound.h"
+
 #include <vector>
-
-namespace {
-
-// A world rectangle moved by (-dx, -dy), saturated into int range, so that the
-// clip of a caller becomes the clip in the coordinates of a called drawing.
-int SaturatedMinus(int value, int delta)
-{
-    const long long moved = static_cast<long long>(value) - delta;
-    if (moved > INT_MAX)
-        return INT_MAX;
-    if (moved < INT_MIN)
-        return INT_MIN;
-    return static_cast<int>(moved);
-}
-
-} // namespace
 
 // Reused between calls so that drawing passes do not allocate.
 std::vector<int>& Tavo_GrPolygonScratch()
@@ -45,8 +30,9 @@ void Tavo_GrSurface::DrawCall(const Tavo_GrCall* call)
     const int dx = call->GetDx();
     const int dy = call->GetDy();
     m_transform = m_transform.Translated(dx, dy);
-    m_worldClip = {SaturatedMinus(callerClip.x1, dx), SaturatedMinus(callerClip.y1, dy),
-                   SaturatedMinus(callerClip.x2, dx), SaturatedMinus(callerClip.y2, dy)};
+    // The caller's clip in the called drawing's coordinates.
+    m_worldClip = {Tavo_GrSubtract(callerClip.x1, dx), Tavo_GrSubtract(callerClip.y1, dy),
+                   Tavo_GrSubtract(callerClip.x2, dx), Tavo_GrSubtract(callerClip.y2, dy)};
 
     ++m_callDepth;
     call->GetDrawing()->DrawItems(*this, false);

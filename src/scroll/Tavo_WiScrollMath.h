@@ -19,52 +19,26 @@ constexpr int MaxBarRange = 32767;
 // The width given to a requested range that is empty or reversed.
 constexpr int DefaultRangeWidth = 100;
 
-inline int Saturate(long long value)
-{
-    if (value > INT_MAX)
-        return INT_MAX;
-    if (value < INT_MIN)
-        return INT_MIN;
-    return static_cast<int>(value);
-}
-
-// Truncation toward zero into int range (NaN gives 0).
-inline int Truncate(double value)
-{
-    if (!(value == value))
-        return 0;
-    if (value >= static_cast<double>(INT_MAX))
-        return INT_MAX;
-    if (value <= static_cast<double>(INT_MIN))
-        return INT_MIN;
-    return static_cast<int>(value);
-}
-
-inline int Add(int a, long long b)
-{
-    return Saturate(static_cast<long long>(a) + b);
-}
-
 // R(v, s): a scroll-unit value in bar units of scale s, rounded outwards (away
 // from zero) unless the quotient is already (nearly) whole, so that a bar
 // range always covers the scroll-unit range it stands for.
 inline int ToBarUnits(int value, double scale)
 {
     const double quotient = value / scale;
-    return Truncate(value > 0 ? quotient + 0.999999 : quotient - 0.999999);
+    return Tavo_GrTruncate(value > 0 ? quotient + 0.999999 : quotient - 0.999999);
 }
 
 // A bar-unit value in scroll units again.
 inline int ToScrollUnits(int barValue, double scale)
 {
-    return Truncate(barValue * scale);
+    return Tavo_GrTruncate(barValue * scale);
 }
 
 // The effective maximum of a requested range: a range that is empty or
 // reversed becomes DefaultRangeWidth wide.
 inline int EffectiveMaximum(int minimum, int maximum)
 {
-    return minimum < maximum ? maximum : Add(minimum, DefaultRangeWidth);
+    return minimum < maximum ? maximum : Tavo_GrAdd(minimum, DefaultRangeWidth);
 }
 
 // Scroll units per bar unit for a range, never below 1.
@@ -85,7 +59,7 @@ inline int Clamp(int value, long long low, long long high)
         v = low;
     if (v > high)
         v = high;
-    return Saturate(v);
+    return Tavo_GrSaturate(v);
 }
 
 // A step of percent of extent, truncated (the horizontal percentage).

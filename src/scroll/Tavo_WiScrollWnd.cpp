@@ -202,7 +202,7 @@ void Tavo_WiScrollWnd::SetScrollPosition(const CPoint& position)
     ForcePositionIntoRange();
     ::SetScrollPos(m_horzBar.GetSafeHwnd(), SB_CTL, ToBarUnits(m_position.x, m_horzScale), TRUE);
     // In inverted-Y mode the top of the range is at the top of the bar.
-    const int barY = m_invertedY ? Saturate(static_cast<long long>(m_rangeMin.y) - m_position.y +
+    const int barY = m_invertedY ? Tavo_GrSaturate(static_cast<long long>(m_rangeMin.y) - m_position.y +
                                             m_rangeMax.y)
                                  : m_position.y;
     ::SetScrollPos(m_vertBar.GetSafeHwnd(), SB_CTL, ToBarUnits(barY, m_vertScale), TRUE);
@@ -236,7 +236,7 @@ void Tavo_WiScrollWnd::ScrollWindowTo(const CPoint& position)
     GetScrollDeviceDeltas(old, m_position, dx, dy, 1);
     // Device pixels grow downwards; inverted-Y scroll units grow upwards.
     if (m_invertedY)
-        dy = Saturate(-static_cast<long long>(dy));
+        dy = Tavo_GrSaturate(-static_cast<long long>(dy));
     // The moved pixels stay; only the uncovered strip is invalidated and
     // erased, and the scrollee paints it at its next paint message.
     CRect client(0, 0, 0, 0);
@@ -250,9 +250,9 @@ void Tavo_WiScrollWnd::ScrollWindowCenterTo(const CPoint& point)
 {
     const int halfWidth = m_windowExtent.cx / 2;
     const int halfHeight = m_windowExtent.cy / 2;
-    const CPoint target(Add(point.x, -static_cast<long long>(halfWidth)),
-                        m_invertedY ? Add(point.y, halfHeight)
-                                    : Add(point.y, -static_cast<long long>(halfHeight)));
+    const CPoint target(Tavo_GrAdd(point.x, -static_cast<long long>(halfWidth)),
+                        m_invertedY ? Tavo_GrAdd(point.y, halfHeight)
+                                    : Tavo_GrAdd(point.y, -static_cast<long long>(halfHeight)));
     ScrollWindowTo(target);
 }
 
@@ -344,7 +344,7 @@ void Tavo_WiScrollWnd::OnHScroll(UINT code, UINT n, CScrollBar* bar)
         BeginThumbDrag();
         const double barOffset =
             static_cast<double>(ThumbPosition(n, bar)) - ToBarUnits(m_rangeMin.x, m_horzScale);
-        target = static_cast<long long>(m_rangeMin.x) + Truncate(barOffset * m_horzScale);
+        target = static_cast<long long>(m_rangeMin.x) + Tavo_GrTruncate(barOffset * m_horzScale);
         break;
     }
     case SB_LEFT:
@@ -365,7 +365,7 @@ void Tavo_WiScrollWnd::OnHScroll(UINT code, UINT n, CScrollBar* bar)
     default:
         return;
     }
-    ScrollToX(Saturate(target));
+    ScrollToX(Tavo_GrSaturate(target));
 }
 
 void Tavo_WiScrollWnd::OnVScroll(UINT code, UINT n, CScrollBar* bar)
@@ -393,7 +393,7 @@ void Tavo_WiScrollWnd::OnVScroll(UINT code, UINT n, CScrollBar* bar)
         BeginThumbDrag();
         const double barOffset =
             static_cast<double>(ThumbPosition(n, bar)) - ToBarUnits(m_rangeMin.y, m_vertScale);
-        const long long offset = Truncate(barOffset * m_vertScale);
+        const long long offset = Tavo_GrTruncate(barOffset * m_vertScale);
         target = m_invertedY ? m_rangeMax.y - offset : m_rangeMin.y + offset;
         break;
     }
@@ -415,7 +415,7 @@ void Tavo_WiScrollWnd::OnVScroll(UINT code, UINT n, CScrollBar* bar)
     default:
         return;
     }
-    ScrollToY(Saturate(target));
+    ScrollToY(Tavo_GrSaturate(target));
 }
 
 // ---- layout -------------------------------------------------------------------
@@ -502,8 +502,8 @@ void Tavo_WiScrollWnd::OnDraw(Tavo_WiScrollee*, CDC*) {}
 void Tavo_WiScrollWnd::GetScrollDeviceDeltas(const CPoint& a, const CPoint& b, int& dx, int& dy,
                                              int)
 {
-    dx = Saturate(static_cast<long long>(a.x) - b.x);
-    dy = Saturate(static_cast<long long>(a.y) - b.y);
+    dx = Tavo_GrSaturate(static_cast<long long>(a.x) - b.x);
+    dy = Tavo_GrSaturate(static_cast<long long>(a.y) - b.y);
 }
 
 void Tavo_WiScrollWnd::OnClick(UINT, UINT, const CPoint&) {}

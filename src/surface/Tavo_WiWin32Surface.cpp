@@ -6,7 +6,7 @@
 
 #include "Tavo_WiLibrary.h"
 #include "Tavo_WiPalette.h"
-#include "Tavo_WiSurfaceMath.h"
+#include "Tavo_GrRound.h"
 
 #include "Port_Env.h"
 #include "Tavo_GrRound.h"
@@ -50,7 +50,7 @@ LOGFONTA DescribeFont(unsigned int pixelHeight)
 {
     LOGFONTA font = {};
     // A positive height asks for the cell height; width 0 lets the mapper choose.
-    font.lfHeight = Tavo_WiSurfaceMath::Saturate(pixelHeight);
+    font.lfHeight = Tavo_GrSaturate(pixelHeight);
     font.lfWeight = FW_MEDIUM;
     font.lfCharSet = ANSI_CHARSET;
     font.lfOutPrecision = OUT_CHARACTER_PRECIS;
@@ -252,7 +252,7 @@ bool Tavo_WiWin32Surface::PollDrawInterrupt()
 
 int Tavo_WiWin32Surface::FlipY(int y) const
 {
-    return Tavo_WiSurfaceMath::Subtract(GetDeviceHeight(), y);
+    return Tavo_GrSubtract(GetDeviceHeight(), y);
 }
 
 #pragma pop_macro("DrawText")

@@ -8,13 +8,11 @@
 // so runs keep their order.
 #include "Tavo_WiWin32Surface.h"
 
-#include "Tavo_WiSurfaceMath.h"
+#include "Tavo_GrRound.h"
 
 #pragma push_macro("DrawText")
 #undef DrawText
 
-using Tavo_WiSurfaceMath::Add;
-using Tavo_WiSurfaceMath::Subtract;
 
 namespace {
 
@@ -63,7 +61,7 @@ void Tavo_WiWin32Surface::AddDot(int x, int y)
     // GDI leaves out a polyline's last point, so this draws exactly (x, y).
     POINT* element = m_dots.Append();
     SetPoint(element[0], x, y);
-    SetPoint(element[1], Add(x, 1), y);
+    SetPoint(element[1], Tavo_GrAdd(x, 1), y);
     if (m_dots.IsFull())
         FlushDots();
 }
@@ -82,7 +80,7 @@ void Tavo_WiWin32Surface::AddLine(int x1, int y1, int x2, int y2)
         return;
     // Extra columns always go to the right.
     for (int i = 1; i <= m_thickenVertLine; ++i)
-        append(Add(x1, i), y1, Add(x2, i), y2);
+        append(Tavo_GrAdd(x1, i), y1, Tavo_GrAdd(x2, i), y2);
 }
 
 void Tavo_WiWin32Surface::AddUniangle(int x0, int y0, int x1, int y1, int x2, int y2)
@@ -140,14 +138,16 @@ void Tavo_WiWin32Surface::AddFilledRect(int l, int t, int r, int b)
 
 void Tavo_WiWin32Surface::AddHollowCircle(int x, int y, int radius)
 {
-    SetBox(*m_hollowCircles.Append(), Subtract(x, radius), Subtract(y, radius), Add(x, radius), Add(y, radius));
+    SetBox(*m_hollowCircles.Append(), Tavo_GrSubtract(x, radius), Tavo_GrSubtract(y, radius), Tavo_GrAdd(x, radius),
+           Tavo_GrAdd(y, radius));
     if (m_hollowCircles.IsFull())
         FlushHollowCircles();
 }
 
 void Tavo_WiWin32Surface::AddFilledCircle(int x, int y, int radius)
 {
-    SetBox(*m_filledCircles.Append(), Subtract(x, radius), Subtract(y, radius), Add(x, radius), Add(y, radius));
+    SetBox(*m_filledCircles.Append(), Tavo_GrSubtract(x, radius), Tavo_GrSubtract(y, radius), Tavo_GrAdd(x, radius),
+           Tavo_GrAdd(y, radius));
     if (m_filledCircles.IsFull())
         FlushFilledCircles();
 }

@@ -4,13 +4,11 @@
 // vertical lines running far off the surface) and appends to a batch.
 #include "Tavo_WiWin32Surface.h"
 
-#include "Tavo_WiSurfaceMath.h"
+#include "Tavo_GrRound.h"
 
 #pragma push_macro("DrawText")
 #undef DrawText
 
-using Tavo_WiSurfaceMath::Add;
-using Tavo_WiSurfaceMath::Subtract;
 
 namespace {
 
@@ -48,7 +46,7 @@ void Tavo_WiWin32Surface::DrawSegment(const Tavo_GrDPoint& from, const Tavo_GrDP
         // A vertical line reaching far beyond the surface is cut just outside
         // it, so that GDI never has to clip a huge span.
         const int height = GetDeviceHeight();
-        const int above = Add(height, 1);
+        const int above = Tavo_GrAdd(height, 1);
         y1 = y1 < 0 ? 0 : (y1 > height ? above : y1);
         y2 = y2 < 0 ? 0 : (y2 > height ? above : y2);
     }
@@ -78,8 +76,8 @@ void Tavo_WiWin32Surface::DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr)
     // maximum column and row. The outline runs through the same corners.
     const int left = rect.xmin;
     const int top = FlipY(rect.ymax);
-    const int right = Add(rect.xmax, 1);
-    const int bottom = Add(FlipY(rect.ymin), 1);
+    const int right = Tavo_GrAdd(rect.xmax, 1);
+    const int bottom = Tavo_GrAdd(FlipY(rect.ymin), 1);
     if (IsHollow())
         AddHollowRect(left, top, right, bottom);
     else
@@ -98,7 +96,8 @@ void Tavo_WiWin32Surface::DrawCircle(Tavo_GrDPoint& centre, int radius, Tavo_GrA
     }
     if (radius <= kLargestTriangleRadius) {
         // Base below the centre, apex above, whatever the fill.
-        AddHollowTriangle(Subtract(x, radius), Add(y, radius), Add(x, radius), Add(y, radius), x, Subtract(y, radius));
+        AddHollowTriangle(Tavo_GrSubtract(x, radius), Tavo_GrAdd(y, radius), Tavo_GrAdd(x, radius),
+                          Tavo_GrAdd(y, radius), x, Tavo_GrSubtract(y, radius));
         return;
     }
     if (IsHollow())

@@ -3,7 +3,7 @@
 // pixels high) a thin line of the text's approximate width stands in for it.
 #include "Tavo_WiWin32Surface.h"
 
-#include "Tavo_WiSurfaceMath.h"
+#include "Tavo_GrRound.h"
 
 #include <algorithm>
 #include <cstring>
@@ -19,7 +19,7 @@ const int kEllipsisLength = 3;
 
 int TextLength(const char* text)
 {
-    return text ? Tavo_WiSurfaceMath::Saturate(static_cast<long long>(std::strlen(text))) : 0;
+    return text ? Tavo_GrSaturate(static_cast<long long>(std::strlen(text))) : 0;
 }
 
 } // namespace
@@ -30,16 +30,16 @@ void Tavo_WiWin32Surface::DrawTextPlaceholder(Tavo_GrDPoint anchor, int width, i
     Tavo_GrDPoint end = anchor;
     switch (m_textAlign & 3) {
     case 2: // right
-        start.x = Tavo_WiSurfaceMath::Subtract(anchor.x, width);
+        start.x = Tavo_GrSubtract(anchor.x, width);
         break;
     case 3: { // centre
         const int half = width / 2;
-        start.x = Tavo_WiSurfaceMath::Subtract(anchor.x, half);
-        end.x = Tavo_WiSurfaceMath::Add(anchor.x, width - half);
+        start.x = Tavo_GrSubtract(anchor.x, half);
+        end.x = Tavo_GrAdd(anchor.x, width - half);
         break;
     }
     default:
-        end.x = Tavo_WiSurfaceMath::Add(anchor.x, width);
+        end.x = Tavo_GrAdd(anchor.x, width);
         break;
     }
     end.x = std::min(end.x, rightLimit);
@@ -52,7 +52,7 @@ void Tavo_WiWin32Surface::DrawText(const char* text, Tavo_GrDPoint& point, Tavo_
     SetCurrentAttr(attr);
     const int length = TextLength(text);
     if (!m_font) {
-        const int width = Tavo_WiSurfaceMath::Saturate(static_cast<long long>(m_fontHeight) * length);
+        const int width = Tavo_GrSaturate(static_cast<long long>(m_fontHeight) * length);
         DrawTextPlaceholder(point, width, INT_MAX, attr);
         return;
     }
@@ -62,7 +62,7 @@ void Tavo_WiWin32Surface::DrawText(const char* text, Tavo_GrDPoint& point, Tavo_
     long long y = static_cast<long long>(GetDeviceHeight()) - point.y - metrics.tmDescent;
     if ((m_textAlign & 12) == 12) // middle: drawn bottom-aligned, half a font lower
         y += m_fontHeight / 2;
-    TextOutA(m_hdc, point.x, Tavo_WiSurfaceMath::Saturate(y), text ? text : "", length);
+    TextOutA(m_hdc, point.x, Tavo_GrSaturate(y), text ? text : "", length);
     m_stats.Add(Tavo_GrSurfaceStats::Texts, 1);
 }
 
@@ -75,7 +75,7 @@ void Tavo_WiWin32Surface::DrawText(const char* text, Tavo_GrDRect& box, Tavo_GrA
     SetCurrentAttr(attr);
     const int length = TextLength(text);
     if (!m_font) {
-        const int width = Tavo_WiSurfaceMath::Saturate(static_cast<long long>(m_fontHeight) * length);
+        const int width = Tavo_GrSaturate(static_cast<long long>(m_fontHeight) * length);
         DrawTextPlaceholder(Tavo_GrDPoint{box.xmin, box.ymax}, width, box.xmax, attr);
         return;
     }
@@ -92,10 +92,10 @@ void Tavo_WiWin32Surface::DrawText(const char* text, Tavo_GrDRect& box, Tavo_GrA
         const int count = GetCharsInBox(text + consumed, box);
         const long long y = top + line * lineHeight;
         if (y > bottom) {
-            TextOutA(m_hdc, box.xmin, Tavo_WiSurfaceMath::Saturate(y), kEllipsis, kEllipsisLength);
+            TextOutA(m_hdc, box.xmin, Tavo_GrSaturate(y), kEllipsis, kEllipsisLength);
             break;
         }
-        TextOutA(m_hdc, box.xmin, Tavo_WiSurfaceMath::Saturate(y), text + consumed, count);
+        TextOutA(m_hdc, box.xmin, Tavo_GrSaturate(y), text + consumed, count);
         consumed += count;
     }
     m_stats.Add(Tavo_GrSurfaceStats::Texts, 1);
