@@ -1,6 +1,6 @@
-// Tavo_WiDataTip: placement from the pointer and the text's extent, keeping
-// on the screen horizontally, one shown tip per process, the notifications to
-// the owner, and hiding by a real key press through the keyboard hook.
+// Tavo_WiDataTip: placement from the pointer and the text's extent, kept on
+// the screen horizontally only, one shown tip per process, the notifications
+// to the owner, and hiding by a real key press through the keyboard hook.
 #include "scroll_test_support.h"
 
 #include "Tavo_WiDataTip.h"
@@ -8,6 +8,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 
 using namespace ScrollTest;
 
@@ -16,20 +17,22 @@ namespace {
 constexpr int ScreenWidth = 1280;
 constexpr int ScreenHeight = 1024;
 
-// The size of a text in the tip's font.
-CSize TextExtent(const char* text)
+// The tip's window rectangle for text shown at pointer, a screen point: the
+// pointer + (16, 16) is where the text starts, with margins of 4 and 2 pixels.
+CRect ExpectedRect(CPoint pointer, const char* text)
 {
     LOGFONTA description = {};
     ::GetObjectA(::GetStockObject(ANSI_VAR_FONT), sizeof description, &description);
     HFONT font = ::CreateFontIndirectA(&description);
     HDC dc = ::GetDC(nullptr);
     HGDIOBJ old = ::SelectObject(dc, font);
-    SIZE size = {};
-    ::GetTextExtentPoint32A(dc, text, static_cast<int>(strlen(text)), &size);
+    SIZE extent = {};
+    ::GetTextExtentPoint32A(dc, text, static_cast<int>(strlen(text)), &extent);
     ::SelectObject(dc, old);
     ::ReleaseDC(nullptr, dc);
     ::DeleteObject(font);
-    return CSize(size.cx, size.cy);
+    const CPoint origin = pointer + CPoint(16, 16);
+    return CRect(origin.x - 4, origin.y - 2, origin.x + extent.cx + 4, origin.y + extent.cy + 2);
 }
 
 CRect WindowRect(const CWnd& wnd)
@@ -39,213 +42,129 @@ CRect WindowRect(const CWnd& wnd)
     return rect;
 }
 
-// An owner window of a given size placed at a screen position.
-struct Owner
+// The owner and wParam of every tip notification, in order.
+using Notes = std::vector<std::pair<HWND, WPARAM>>;
+Notes Notifications()
 {
-    Owner(int x, int y, int width, int height) : host(x, y, width, height), sink(host.Handle())
-    {
-        ::SetWindowPos(sink.Handle(), nullptr, 0, 0, width, height, SWP_NOZORDER);
-    }
-    HostWindow host;
-    NotificationSink sink;
-};
+    Notes result;
+    for (const TestWindow::Note& note : TestWindow::Notes())
+        if (note.message == Tavo_WiDataTip::GetNotifyMsg())
+            result.emplace_back(note.window, note.wParam);
+    return result;
+}
 
 class DataTipTest : public ::testing::Test
 {
 protected:
     void SetUp() override
     {
-        ASSERT_TRUE(tipA.Create(ownerA.sink.Wnd()));
-        ASSERT_TRUE(tipB.Create(ownerB.sink.Wnd()));
-        NotificationSink::Notes().clear();
+        ASSERT_TRUE(tipA.Create(ownerA.Wnd()));
+        ASSERT_TRUE(tipB.Create(ownerB.Wnd()));
+        TestWindow::Notes().clear();
     }
 
     void TearDown() override
     {
-        tipA.Hide();
-        tipB.Hide();
         tipA.DestroyWindow();
         tipB.DestroyWindow();
         PumpPending();
     }
 
-    void Tick(Tavo_WiDataTip& tip)
-    {
-        ::SendMessageA(tip.GetSafeHwnd(), WM_TIMER, Tavo_WiDataTip::TimerId, 0);
-    }
-
-    // Owner window and wParam of every tip notification, in order.
-    std::vector<std::pair<HWND, WPARAM>> Notifications() const
-    {
-        std::vector<std::pair<HWND, WPARAM>> result;
-        for (const NotificationSink::Note& note : NotificationSink::Notes())
-            if (note.message == Tavo_WiDataTip::GetNotifyMsg())
-                result.emplace_back(note.window, note.wParam);
-        return result;
-    }
-
-    Owner ownerA{100, 100, 300, 200};
-    Owner ownerB{500, 100, 300, 200};
+    // Each owner is a child filling its top-level window at (100, 100) and (500, 100).
+    TestWindow hostA{CRect(100, 100, 400, 300)};
+    TestWindow hostB{CRect(500, 100, 800, 300)};
+    TestWindow ownerA{CRect(0, 0, 300, 200), hostA.Handle()};
+    TestWindow ownerB{CRect(0, 0, 300, 200), hostB.Handle()};
     Tavo_WiDataTip tipA;
     Tavo_WiDataTip tipB;
 };
 
-TEST_F(DataTipTest, NotifyMessageIsTheRegisteredTipMessage)
-{
-    EXPECT_EQ(Tavo_WiDataTip::GetNotifyMsg(), ::RegisterWindowMessageA("BrymarTavo_WiDataTipMessage"));
-}
-
-TEST_F(DataTipTest, CreatedTipIsAHiddenToolWindowPopup)
-{
-    const HWND hwnd = tipA.GetSafeHwnd();
-    EXPECT_FALSE(::IsWindowVisible(hwnd));
-    EXPECT_EQ(tipA.IsVisible(), 0);
-    EXPECT_NE(::GetWindowLongA(hwnd, GWL_EXSTYLE) & WS_EX_TOOLWINDOW, 0);
-    const DWORD style = static_cast<DWORD>(::GetWindowLongA(hwnd, GWL_STYLE));
-    EXPECT_NE(style & WS_POPUP, 0u);
-    EXPECT_NE(style & WS_BORDER, 0u);
-    EXPECT_EQ(::GetWindow(hwnd, GW_OWNER), ownerA.host.Handle()) << "a popup is owned by the top-level window";
-}
-
 TEST_F(DataTipTest, ShowPlacesTheTipBelowRightOfThePointerSizedByTheText)
 {
-    const char* text = "Data tip text";
-    tipA.Show(CPoint(10, 20), text);
-    const CSize extent = TextExtent(text);
-    const int x = 100 + 10 + 16;
-    const int y = 100 + 20 + 16;
-    EXPECT_EQ(WindowRect(tipA), CRect(x - 4, y - 2, x + extent.cx + 4, y + extent.cy + 2));
+    tipA.Show(CPoint(10, 20), "Data tip text");
+    EXPECT_EQ(WindowRect(tipA), ExpectedRect(CPoint(110, 120), "Data tip text"));
     EXPECT_TRUE(::IsWindowVisible(tipA.GetSafeHwnd()));
     EXPECT_EQ(tipA.IsVisible(), 1);
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{ownerA.sink.Handle(), 1}}));
+    EXPECT_EQ(Notifications(), (Notes{{ownerA.Handle(), 1}}));
 }
 
-TEST_F(DataTipTest, TipPaintsInTheToolTipColours)
+TEST_F(DataTipTest, TipIsMovedOntoTheScreenHorizontallyButNeverUp)
 {
-    if (!EnglishLocale())
-        GTEST_SKIP() << "the background comes from the library's own window class";
-    tipA.Show(CPoint(10, 20), "Colours");
-    ::UpdateWindow(tipA.GetSafeHwnd());
-    CRect client;
-    ::GetClientRect(tipA.GetSafeHwnd(), &client);
-    Pixels pixels(tipA.GetSafeHwnd(), client.Width(), client.Height());
-    EXPECT_EQ(pixels.At(0, 0), ::GetSysColor(COLOR_INFOBK));
-    EXPECT_EQ(pixels.At(client.Width() - 1, client.Height() - 1), ::GetSysColor(COLOR_INFOBK));
-    bool sawText = false;
-    for (int y = 0; y < client.Height(); ++y)
-        for (int x = 0; x < client.Width(); ++x)
-            sawText = sawText || pixels.At(x, y) == ::GetSysColor(COLOR_INFOTEXT);
-    EXPECT_TRUE(sawText);
+    const auto shownAt = [](const CRect& ownerRect, CPoint point, const char* text) {
+        TestWindow owner(ownerRect);
+        Tavo_WiDataTip tip;
+        EXPECT_TRUE(tip.Create(owner.Wnd()));
+        tip.Show(point, text);
+        const CRect rect = WindowRect(tip);
+        tip.Hide();
+        return rect;
+    };
+    // Past the right edge: moved left to end on it.
+    const char* text = "a tip too long to fit";
+    CRect natural = ExpectedRect(CPoint(ScreenWidth - 50, 310), text);
+    EXPECT_EQ(shownAt(CRect(ScreenWidth - 100, 300, ScreenWidth, 400), CPoint(50, 10), text),
+              natural + CPoint(ScreenWidth - natural.right, 0));
+    // Wider than the screen: starts at its left edge.
+    const std::string wide(400, 'W');
+    natural = ExpectedRect(CPoint(110, 120), wide.c_str());
+    ASSERT_GT(natural.Width(), ScreenWidth);
+    EXPECT_EQ(shownAt(CRect(100, 100, 400, 300), CPoint(10, 20), wide.c_str()),
+              natural + CPoint(-natural.left, 0));
+    // Past the bottom: not moved up.
+    natural = ExpectedRect(CPoint(220, ScreenHeight - 10), "low");
+    ASSERT_GT(natural.bottom, ScreenHeight);
+    EXPECT_EQ(shownAt(CRect(200, ScreenHeight - 40, 400, ScreenHeight), CPoint(20, 30), "low"), natural);
 }
 
-TEST_F(DataTipTest, PointOnTheRightOrBottomEdgeShowsNothingButHidesTheShownTip)
-{
-    tipA.Show(CPoint(10, 20), "first");
-    tipA.Show(CPoint(300, 20), "on the right edge");
-    EXPECT_EQ(tipA.IsVisible(), 0);
-    EXPECT_FALSE(::IsWindowVisible(tipA.GetSafeHwnd()));
-    tipA.Show(CPoint(10, 200), "on the bottom edge");
-    EXPECT_EQ(tipA.IsVisible(), 0);
-    const HWND a = ownerA.sink.Handle();
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{a, 1}, {a, 0}}));
-}
-
-TEST_F(DataTipTest, TipPassingTheRightScreenEdgeIsMovedLeftOntoIt)
-{
-    Owner nearRight(ScreenWidth - 100, 300, 100, 100);
-    Tavo_WiDataTip tip;
-    ASSERT_TRUE(tip.Create(nearRight.sink.Wnd()));
-    tip.Show(CPoint(50, 10), "a tip too long to fit");
-    const CRect rect = WindowRect(tip);
-    EXPECT_EQ(rect.right, ScreenWidth);
-    EXPECT_EQ(rect.top, 300 + 10 + 16 - 2);
-    EXPECT_EQ(rect.Width(), TextExtent("a tip too long to fit").cx + 8);
-    tip.Hide();
-}
-
-TEST_F(DataTipTest, TipWiderThanTheScreenStartsAtItsLeftEdge)
-{
-    const std::string text(400, 'W');
-    ASSERT_GT(TextExtent(text.c_str()).cx, ScreenWidth);
-    tipA.Show(CPoint(10, 20), text.c_str());
-    const CRect rect = WindowRect(tipA);
-    EXPECT_EQ(rect.left, 0);
-    EXPECT_GT(rect.right, ScreenWidth);
-}
-
-TEST_F(DataTipTest, TipNearTheBottomOfTheScreenIsNotMovedUp)
-{
-    Owner nearBottom(200, ScreenHeight - 40, 200, 40);
-    Tavo_WiDataTip tip;
-    ASSERT_TRUE(tip.Create(nearBottom.sink.Wnd()));
-    tip.Show(CPoint(20, 30), "low");
-    EXPECT_EQ(WindowRect(tip).top, ScreenHeight - 40 + 30 + 16 - 2);
-    EXPECT_GT(WindowRect(tip).bottom, ScreenHeight);
-    tip.Hide();
-}
-
-TEST_F(DataTipTest, ShowingTipBHidesTipAFirst)
+TEST_F(DataTipTest, ShowingTipBHidesTipAFirstAndHidingAHiddenTipStillNotifies)
 {
     tipA.Show(CPoint(10, 20), "A");
-    NotificationSink::Notes().clear();
+    TestWindow::Notes().clear();
     tipB.Show(CPoint(10, 20), "B");
     EXPECT_EQ(tipA.IsVisible(), 0);
     EXPECT_FALSE(::IsWindowVisible(tipA.GetSafeHwnd()));
     EXPECT_EQ(tipB.IsVisible(), 1);
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{ownerA.sink.Handle(), 0},
-                                                                     {ownerB.sink.Handle(), 1}}));
-}
+    EXPECT_EQ(Notifications(), (Notes{{ownerA.Handle(), 0}, {ownerB.Handle(), 1}}));
 
-TEST_F(DataTipTest, HideOnAHiddenTipStillNotifiesItsOwner)
-{
-    tipB.Show(CPoint(10, 20), "B");
-    NotificationSink::Notes().clear();
+    TestWindow::Notes().clear();
     tipA.Hide();
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{ownerA.sink.Handle(), 0}}));
+    EXPECT_EQ(Notifications(), (Notes{{ownerA.Handle(), 0}}));
     EXPECT_EQ(tipB.IsVisible(), 1) << "another tip is left as it is";
 }
 
 TEST_F(DataTipTest, KeyPressHidesTheShownTipAtTheNextTick)
 {
+    // A key pressed while no tip is shown is forgotten by the next Show.
+    SendKey('K', FreshTime());
+    PumpInput();
     tipA.Show(CPoint(10, 20), "keys");
+    const auto tick = [this] { ::SendMessageA(tipA.GetSafeHwnd(), WM_TIMER, Tavo_WiDataTip::TimerId, 0); };
+    tick();
+    ASSERT_EQ(tipA.IsVisible(), 1);
+
     SendKey('K', FreshTime());
     PumpInput();
     EXPECT_EQ(tipA.IsVisible(), 1) << "hidden only at the tick";
-    Tick(tipA);
+    tick();
     EXPECT_EQ(tipA.IsVisible(), 0);
     EXPECT_FALSE(::IsWindowVisible(tipA.GetSafeHwnd()));
-    const HWND a = ownerA.sink.Handle();
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{a, 1}, {a, 0}}));
+    EXPECT_EQ(Notifications(), (Notes{{ownerA.Handle(), 1}, {ownerA.Handle(), 0}}));
 }
 
-TEST_F(DataTipTest, KeyPressWhileNoTipIsShownIsForgottenByTheNextShow)
-{
-    SendKey('K', FreshTime());
-    PumpInput();
-    tipA.Show(CPoint(10, 20), "after the key");
-    Tick(tipA);
-    EXPECT_EQ(tipA.IsVisible(), 1);
-}
-
-TEST_F(DataTipTest, TipWithoutAWindowShowsNothing)
-{
-    Tavo_WiDataTip unborn;
-    unborn.Show(CPoint(1, 1), "nothing");
-    EXPECT_EQ(unborn.IsVisible(), 0);
-    unborn.Hide();
-    EXPECT_EQ(unborn.IsVisible(), 0);
-}
-
-TEST_F(DataTipTest, DestroyingTheShownTipLeavesNoCurrentTip)
+TEST_F(DataTipTest, DestroyedTipIsNoLongerTheCurrentTip)
 {
     {
         Tavo_WiDataTip shortLived;
-        ASSERT_TRUE(shortLived.Create(ownerA.sink.Wnd()));
+        ASSERT_TRUE(shortLived.Create(ownerA.Wnd()));
         shortLived.Show(CPoint(10, 20), "brief");
     }
-    NotificationSink::Notes().clear();
+    TestWindow::Notes().clear();
     tipB.Show(CPoint(10, 20), "B");
-    EXPECT_EQ(Notifications(), (std::vector<std::pair<HWND, WPARAM>>{{ownerB.sink.Handle(), 1}}));
+    EXPECT_EQ(Notifications(), (Notes{{ownerB.Handle(), 1}}));
+    // A tip without a window shows nothing.
+    Tavo_WiDataTip unborn;
+    unborn.Show(CPoint(1, 1), "nothing");
+    EXPECT_EQ(unborn.IsVisible(), 0);
 }
 
 }  // namespace

@@ -1,5 +1,5 @@
-// Tavo_WiParkedCursorMonitor: rests begin when the park timer fires (sent
-// explicitly) with the pointer still inside an active window, and end at the
+// Tavo_WiParkedCursorMonitor: a rest begins when the park timer fires (sent
+// explicitly) with the pointer still inside an active window, and ends at the
 // next move to another point or any button.
 #include "scroll_test_support.h"
 
@@ -13,24 +13,24 @@ namespace {
 
 constexpr int HostX = 200;
 constexpr int HostY = 150;
+const CPoint NoPoint(-1, -1);
 
 class ParkedCursorTest : public ::testing::Test
 {
 protected:
     void SetUp() override
     {
-        // The owner fills the host's top-left 300 x 200 pixels.
-        ::SetWindowPos(owner.Handle(), nullptr, 0, 0, 300, 200, SWP_NOZORDER);
         ASSERT_TRUE(monitor.Create(owner.Wnd(), Tavo_WiParkedCursorMonitor::ControlId));
         ::SetForegroundWindow(host.Handle());
         ::SetActiveWindow(host.Handle());
         ::SetCursorPos(HostX + 30, HostY + 40);
-        NotificationSink::Notes().clear();
+        TestWindow::Notes().clear();
     }
 
     void TearDown() override { monitor.DestroyWindow(); }
 
-    void Relay(UINT message, int x = 0, int y = 0, WPARAM wParam = 0)
+    // Pre-translates a message of the owner at a client point.
+    void Relay(UINT message, int x, int y, WPARAM wParam = 0)
     {
         MSG msg = {};
         msg.hwnd = owner.Handle();
@@ -49,62 +49,35 @@ protected:
     std::vector<WPARAM> Notifications() const
     {
         std::vector<WPARAM> result;
-        for (const NotificationSink::Note& note : NotificationSink::Notes())
+        for (const TestWindow::Note& note : TestWindow::Notes())
             if (note.window == owner.Handle() && note.message == Tavo_WiParkedCursorMonitor::GetNotifyMsg())
                 result.push_back(note.wParam);
         return result;
     }
 
-    HostWindow host{HostX, HostY, 400, 300};
-    NotificationSink owner{host.Handle()};
+    TestWindow host{CRect(HostX, HostY, HostX + 400, HostY + 300)};
+    TestWindow owner{CRect(0, 0, 300, 200), host.Handle()};
     Tavo_WiParkedCursorMonitor monitor;
 };
 
-const CPoint NoPoint(-1, -1);
-
-TEST_F(ParkedCursorTest, NotifyMessageIsTheRegisteredMonitorMessage)
+TEST_F(ParkedCursorTest, RestBeginsWhenTheTimerFiresAfterAMoveAndEndsOnlyAtAMoveElsewhere)
 {
-    EXPECT_EQ(Tavo_WiParkedCursorMonitor::GetNotifyMsg(),
-              ::RegisterWindowMessageA("BrymarTavo_WiParkedCursorMonitorMessage"));
-}
-
-TEST_F(ParkedCursorTest, MonitorIsAnInvisibleZeroSizedChild)
-{
-    const HWND hwnd = monitor.GetSafeHwnd();
-    EXPECT_EQ(::GetParent(hwnd), owner.Handle());
-    EXPECT_EQ(::GetDlgCtrlID(hwnd), 2000);
-    EXPECT_FALSE(::IsWindowVisible(hwnd));
-    EXPECT_EQ(ChildRect(hwnd), CRect(0, 0, 0, 0));
-    EXPECT_EQ(monitor.IsEnabled(), 1);
-    EXPECT_EQ(monitor.IsParked(), 0);
-    EXPECT_EQ(monitor.GetParkPoint(), NoPoint);
-}
-
-TEST_F(ParkedCursorTest, RestBeginsWhenTheParkTimerFiresAfterAMove)
-{
+    FireParkTimer();
+    EXPECT_EQ(monitor.IsParked(), 0) << "no move, no rest";
     Relay(WM_MOUSEMOVE, 30, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
     FireParkTimer();
     EXPECT_EQ(monitor.IsParked(), 1);
     // The park point is where the pointer is, in the owner's client coordinates.
     EXPECT_EQ(monitor.GetParkPoint(), CPoint(30, 40));
-    EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
-}
 
-TEST_F(ParkedCursorTest, TimerWithoutAMoveBeginsNoRest)
-{
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
-    EXPECT_TRUE(Notifications().empty());
-}
-
-TEST_F(ParkedCursorTest, RepeatedPositionNeitherEndsTheRestNorRestartsTheTimer)
-{
     Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    Relay(WM_MOUSEMOVE, 30, 40);
+    FireParkTimer();   // would end and begin the rest again had the move restarted the timer
+    Relay(WM_NCMOUSEMOVE, 90, 90);
+    Relay(WM_MOUSEWHEEL, 90, 90, MAKEWPARAM(0, 120));
+    Relay(WM_KEYDOWN, 0, 0, 'A');
+    monitor.RelayEvent(nullptr);
     EXPECT_EQ(monitor.IsParked(), 1);
-    FireParkTimer();   // would end and begin the rest again had the timer restarted
     EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
 
     // One pixel away ends it.
@@ -133,16 +106,7 @@ TEST_F(ParkedCursorTest, HeldButtonKeepsTheMonitorIdleUntilReleaseAndALaterMove)
     EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
 }
 
-TEST_F(ParkedCursorTest, ButtonPressEndsARest)
-{
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    Relay(WM_NCRBUTTONDOWN, 30, 40);
-    EXPECT_EQ(monitor.IsParked(), 0);
-    EXPECT_EQ(Notifications(), (std::vector<WPARAM>{1, 0}));
-}
-
-TEST_F(ParkedCursorTest, DoubleClickEndsARestAndClearsTheButtonState)
+TEST_F(ParkedCursorTest, DoubleClickOrAnyButtonEndsARest)
 {
     Relay(WM_MOUSEMOVE, 30, 40);
     Relay(WM_LBUTTONDOWN, 30, 40, MK_LBUTTON);
@@ -155,12 +119,20 @@ TEST_F(ParkedCursorTest, DoubleClickEndsARestAndClearsTheButtonState)
     Relay(WM_MOUSEMOVE, 30, 40);
     FireParkTimer();
     EXPECT_EQ(monitor.IsParked(), 1) << "the double click left no button down";
-    EXPECT_EQ(Notifications(), (std::vector<WPARAM>{1, 0, 1}));
+    Relay(WM_NCRBUTTONDOWN, 30, 40);
+    EXPECT_EQ(monitor.IsParked(), 0);
+    EXPECT_EQ(Notifications(), (std::vector<WPARAM>{1, 0, 1, 0}));
 }
 
-TEST_F(ParkedCursorTest, DisablingKeepsTheRestUntilTheNextMoveWhichStartsNoTimer)
+TEST_F(ParkedCursorTest, DisablingStopsThePendingTimerAndKeepsARestUntilTheNextMove)
 {
     Relay(WM_MOUSEMOVE, 30, 40);
+    monitor.Enable(0);
+    monitor.Enable(1);
+    FireParkTimer();
+    EXPECT_EQ(monitor.IsParked(), 0);
+
+    Relay(WM_MOUSEMOVE, 31, 40);
     FireParkTimer();
     monitor.Enable(0);
     EXPECT_EQ(monitor.IsEnabled(), 0);
@@ -168,7 +140,7 @@ TEST_F(ParkedCursorTest, DisablingKeepsTheRestUntilTheNextMoveWhichStartsNoTimer
     Relay(WM_MOUSEMOVE, 32, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
     FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
+    EXPECT_EQ(monitor.IsParked(), 0) << "the move started no timer";
 
     // Enabling starts nothing until a move.
     monitor.Enable(1);
@@ -179,42 +151,22 @@ TEST_F(ParkedCursorTest, DisablingKeepsTheRestUntilTheNextMoveWhichStartsNoTimer
     EXPECT_EQ(monitor.IsParked(), 1);
 }
 
-TEST_F(ParkedCursorTest, DisablingStopsAPendingTimer)
+TEST_F(ParkedCursorTest, NoRestOverAnInactiveApplicationOrOutsideTheOwner)
 {
-    Relay(WM_MOUSEMOVE, 30, 40);
-    monitor.Enable(0);
-    monitor.Enable(1);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
-}
-
-TEST_F(ParkedCursorTest, NoRestOverAnInactiveApplication)
-{
-    HostWindow other(700, 600, 100, 100);   // activates itself
-    ASSERT_EQ(::GetActiveWindow(), other.Handle());
-    Relay(WM_MOUSEMOVE, 30, 40);
+    {
+        TestWindow other(CRect(700, 600, 800, 700));   // activates itself
+        ASSERT_EQ(::GetActiveWindow(), other.Handle());
+        Relay(WM_MOUSEMOVE, 30, 40);
+        FireParkTimer();
+        EXPECT_EQ(monitor.IsParked(), 0);
+    }
+    ::SetForegroundWindow(host.Handle());
+    ::SetActiveWindow(host.Handle());
+    ::SetCursorPos(HostX + 350, HostY + 40);   // in the host, outside the owner
+    Relay(WM_MOUSEMOVE, 31, 40);
     FireParkTimer();
     EXPECT_EQ(monitor.IsParked(), 0);
     EXPECT_TRUE(Notifications().empty());
-}
-
-TEST_F(ParkedCursorTest, NoRestWhenThePointerHasLeftTheOwner)
-{
-    ::SetCursorPos(HostX + 350, HostY + 40);   // in the host, outside the owner
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
-}
-
-TEST_F(ParkedCursorTest, OtherMessagesAreIgnored)
-{
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    Relay(WM_NCMOUSEMOVE, 90, 90);
-    Relay(WM_MOUSEWHEEL, 90, 90, MAKEWPARAM(0, 120));
-    Relay(WM_KEYDOWN, 0, 0, 'A');
-    EXPECT_EQ(monitor.IsParked(), 1);
-    EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
 }
 
 TEST_F(ParkedCursorTest, RestEndsSilentlyOnceTheOwnerIsGone)
@@ -227,12 +179,6 @@ TEST_F(ParkedCursorTest, RestEndsSilentlyOnceTheOwnerIsGone)
     Relay(WM_MOUSEMOVE, 31, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
     EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
-}
-
-TEST_F(ParkedCursorTest, NullMessageIsIgnored)
-{
-    monitor.RelayEvent(nullptr);
-    EXPECT_EQ(monitor.IsParked(), 0);
 }
 
 }  // namespace

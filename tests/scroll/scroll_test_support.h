@@ -1,7 +1,7 @@
-// Shared helpers of the scrolling-window tests: a host top-level window on the
-// virtual display, a scroll window that records every call of its virtual
-// operations, a message pump bounded by a deadline, input with explicit
-// message times, and pixel read-back.
+// Shared helpers of the scrolling-window tests: plain windows on the virtual
+// display, a scroll window that records its virtual operations, a message
+// pump bounded by a deadline, input with explicit message times, and pixel
+// read-back.
 #pragma once
 
 #include <afxwin.h>
@@ -11,50 +11,36 @@
 #include <functional>
 #include <ostream>
 #include <string>
+#include <tuple>
 #include <vector>
 
 namespace ScrollTest {
 
-// ---- message pump ---------------------------------------------------------------
-
-// Dispatches every message that is pending now, the way the application's
-// pump does (pre-translation by the target and its parents first). Real
-// WM_TIMER messages are dropped: the tests drive every timer themselves by
-// sending WM_TIMER.
+// Dispatches every pending message as the application's pump does. Real
+// WM_TIMER messages are dropped: the tests drive every timer by sending it.
 void PumpPending();
-
-// Pumps as PumpPending does until done() holds or the deadline passes;
-// returns done().
+// Pumps until done() holds or the deadline passes; returns done().
 bool PumpUntil(const std::function<bool()>& done, DWORD timeoutMs = 3000);
-
-// ---- input with explicit message times --------------------------------------------
+// Pumps until no input message is left in the queue.
+void PumpInput();
 
 // A mouse event at a screen point, delivered with exactly this message time.
 void SendMouse(DWORD buttonFlags, POINT screenPoint, DWORD time);
 // A key press and release.
 void SendKey(WORD virtualKey, DWORD time);
+// A base for explicit message times, at least two seconds after every base
+// handed out before, so that no two tests' clicks make a double click.
+DWORD FreshTime();
 
-// ---- windows ---------------------------------------------------------------------
+// Whether the library uses its own window classes in this process (the
+// user's default locale is English).
+bool EnglishLocale();
 
-// A plain top-level window at a fixed screen position, shown and activated.
-class HostWindow
-{
-public:
-    HostWindow(int x, int y, int width, int height);
-    ~HostWindow();
-    HostWindow(const HostWindow&) = delete;
-    HostWindow& operator=(const HostWindow&) = delete;
-
-    HWND Handle() const { return m_hwnd; }
-    CWnd* Wnd() { return &m_wnd; }
-
-private:
-    HWND m_hwnd = nullptr;
-    CWnd m_wnd;   // attached to m_hwnd for the framework's calls
-};
-
-// A plain window that records the registered messages it receives.
-class NotificationSink
+// A plain window attached to a CWnd for the framework's calls: a shown and
+// activated top-level window at a screen rectangle when parent is null, a
+// visible child at a client rectangle otherwise. Every registered message
+// any of them receives is noted, in order.
+class TestWindow
 {
 public:
     struct Note
@@ -64,14 +50,13 @@ public:
         WPARAM wParam;
     };
 
-    explicit NotificationSink(HWND parent = nullptr);
-    ~NotificationSink();
-    NotificationSink(const NotificationSink&) = delete;
-    NotificationSink& operator=(const NotificationSink&) = delete;
+    explicit TestWindow(const CRect& rect, HWND parent = nullptr);
+    ~TestWindow();
+    TestWindow(const TestWindow&) = delete;
+    TestWindow& operator=(const TestWindow&) = delete;
 
     HWND Handle() const { return m_hwnd; }
     CWnd* Wnd() { return &m_wnd; }
-    // Every note received by any sink, in order.
     static std::vector<Note>& Notes();
 
 private:
@@ -90,8 +75,8 @@ struct Call
 
     bool operator==(const Call& other) const
     {
-        return name == other.name && button == other.button && flags == other.flags &&
-               point == other.point && completed == other.completed;
+        return std::tie(name, button, flags, point.x, point.y, completed) ==
+               std::tie(other.name, other.button, other.flags, other.point.x, other.point.y, other.completed);
     }
 };
 std::ostream& operator<<(std::ostream& out, const Call& call);
@@ -101,70 +86,66 @@ class RecordingScrollWnd : public Tavo_WiScrollWnd
 {
 public:
     std::vector<Call> calls;
-    // Asked by GetDataTipText.
-    CString dataTipText;
-    // Paints the view when set.
-    std::function<void(Tavo_WiScrollee*, CDC*)> painter;
-    // Device deltas when set; the base behaviour otherwise.
-    std::function<void(const CPoint&, const CPoint&, int&, int&, int)> deltas;
+    CString dataTipText;                                    // answered by GetDataTipText
+    std::function<void(Tavo_WiScrollee*, CDC*)> painter;   // paints the view when set
 
     std::vector<Call> CallsNamed(const std::string& name) const;
     void Clear() { calls.clear(); }
 
-    using Tavo_WiScrollWnd::SetDragScrollingFlag;
-
-    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override;
-    void GetScrollDeviceDeltas(const CPoint& a, const CPoint& b, int& dx, int& dy,
-                               int scrolling) override;
-    void OnClick(UINT button, UINT flags, const CPoint& point) override;
-    void OnDoubleClick(UINT button, UINT flags, const CPoint& point) override;
-    void OnDragStart(UINT button, UINT flags, const CPoint& point) override;
-    void OnDragMove(UINT button, UINT flags, const CPoint& point) override;
-    void OnDragEnd(UINT button, UINT flags, const CPoint& point, int completed) override;
-    void OnDragAbort() override;
-    void OnParkedCursorStart(const CPoint& point) override;
-    void OnParkedCursorEnd() override;
-    CString GetDataTipText(const CPoint& point) override;
-    void OnDragScrollStart(const CPoint& position) override;
-    void OnDragScrollMove(const CPoint& position) override;
-    void OnDragScrollEnd(const CPoint& position) override;
-    void OnNonDragScrollEnd(const CPoint& position) override;
+    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override
+    {
+        if (painter)
+            painter(scrollee, dc);
+    }
+    // Records only the calls that really move pixels.
+    void GetScrollDeviceDeltas(const CPoint& a, const CPoint& b, int& dx, int& dy, int scrolling) override
+    {
+        if (scrolling)
+            Record("ScrollDeltas", b);
+        Tavo_WiScrollWnd::GetScrollDeviceDeltas(a, b, dx, dy, scrolling);
+    }
+    void OnClick(UINT button, UINT flags, const CPoint& point) override { Record("Click", point, button, flags); }
+    void OnDoubleClick(UINT button, UINT flags, const CPoint& point) override { Record("DoubleClick", point, button, flags); }
+    void OnDragStart(UINT button, UINT flags, const CPoint& point) override { Record("DragStart", point, button, flags); }
+    void OnDragMove(UINT button, UINT flags, const CPoint& point) override { Record("DragMove", point, button, flags); }
+    void OnDragEnd(UINT button, UINT flags, const CPoint& point, int completed) override
+    {
+        Record("DragEnd", point, button, flags, completed);
+    }
+    void OnDragAbort() override { Record("DragAbort", CPoint(0, 0)); }
+    void OnParkedCursorStart(const CPoint& point) override
+    {
+        Record("ParkedStart", point);
+        Tavo_WiScrollWnd::OnParkedCursorStart(point);
+    }
+    void OnParkedCursorEnd() override
+    {
+        Record("ParkedEnd", CPoint(0, 0));
+        Tavo_WiScrollWnd::OnParkedCursorEnd();
+    }
+    CString GetDataTipText(const CPoint& point) override
+    {
+        Record("DataTipText", point);
+        return dataTipText;
+    }
+    void OnDragScrollStart(const CPoint& position) override { Record("DragScrollStart", position); }
+    void OnDragScrollMove(const CPoint& position) override { Record("DragScrollMove", position); }
+    void OnDragScrollEnd(const CPoint& position) override { Record("DragScrollEnd", position); }
+    void OnNonDragScrollEnd(const CPoint& position) override { Record("NonDragScrollEnd", position); }
 
 private:
     void Record(const char* name, const CPoint& point, UINT button = 0, UINT flags = 0,
-                int completed = -1);
+                int completed = -1)
+    {
+        calls.push_back({name, button, flags, point, completed});
+    }
 };
 
-// ---- pixels ------------------------------------------------------------------------
+// A pixel of a window's client area as on screen.
+COLORREF PixelAt(HWND window, int x, int y);
 
-// The window's client pixels as on screen, row by row, as 0x00RRGGBB.
-class Pixels
-{
-public:
-    Pixels(HWND window, int width, int height);
-    COLORREF At(int x, int y) const;   // as a COLORREF (0x00BBGGRR)
-    int Width() const { return m_width; }
-    int Height() const { return m_height; }
-
-private:
-    int m_width;
-    int m_height;
-    std::vector<DWORD> m_bits;
-};
-
-// The client rectangle of child in its parent's client coordinates.
+// The window rectangle of child in its parent's client coordinates.
 CRect ChildRect(HWND child);
-
-}  // namespace ScrollTest
-
-namespace ScrollTest {
-
-// A base for explicit message times: at least two seconds after every base
-// handed out before, so that no two tests' clicks make a double click.
-DWORD FreshTime();
-
-// Pumps until no input message is left in the queue.
-void PumpInput();
 
 }  // namespace ScrollTest
 
@@ -178,11 +159,3 @@ inline void PrintTo(const CPoint& point, std::ostream* out)
 {
     *out << "(" << point.x << ", " << point.y << ")";
 }
-
-namespace ScrollTest {
-
-// Whether the library uses its own window classes in this process (the user's
-// default locale is English).
-bool EnglishLocale();
-
-}  // namespace ScrollTest

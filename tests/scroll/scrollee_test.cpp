@@ -1,6 +1,6 @@
 // Tavo_WiScrollee: real mouse input with explicit message times classified
 // into clicks, double clicks and drags; capture handling; the background
-// erase; painting through the scroll window; parked-cursor notifications.
+// erase; a rest showing the data tip; the window classes under each locale.
 #include "scroll_test_support.h"
 
 #include "Tavo_WiDataTip.h"
@@ -10,7 +10,6 @@
 
 #include <cstdlib>
 #include <string>
-#include <utility>
 
 using namespace ScrollTest;
 
@@ -37,7 +36,7 @@ protected:
         PumpPending();
         ASSERT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth, WndHeight));
         base = FreshTime();
-        // Start every test with the pointer resting inside, no button down.
+        // Every test starts with the pointer resting inside, no button down.
         Input(MoveOnly, CPoint(1, 1), 0);
         wnd.Clear();
     }
@@ -45,11 +44,11 @@ protected:
     void TearDown() override
     {
         // No button stays down for the next test.
-        const std::pair<int, DWORD> buttons[] = {{VK_LBUTTON, LeftUp}, {VK_RBUTTON, RightUp},
-                                                 {VK_MBUTTON, MOUSEEVENTF_MIDDLEUP}};
-        for (const auto& button : buttons)
-            if (::GetAsyncKeyState(button.first) & 0x8000)
-                Input(button.second, CPoint(1, 1), 1900);
+        const DWORD releases[][2] = {
+            {VK_LBUTTON, LeftUp}, {VK_RBUTTON, RightUp}, {VK_MBUTTON, MOUSEEVENTF_MIDDLEUP}};
+        for (const auto& release : releases)
+            if (::GetAsyncKeyState(static_cast<int>(release[0])) & 0x8000)
+                Input(release[1], CPoint(1, 1), 1900);
         ::ReleaseCapture();
         wnd.DestroyWindow();
         PumpPending();
@@ -64,11 +63,9 @@ protected:
         PumpInput();
     }
 
-    void FireHoldTimer()
-    {
-        ::SendMessageA(Scrollee(), WM_TIMER, Tavo_WiScrollee::HoldTimerId, 0);
-    }
+    void FireHoldTimer() { ::SendMessageA(Scrollee(), WM_TIMER, Tavo_WiScrollee::HoldTimerId, 0); }
 
+    // The recorded calls without those of resting.
     std::vector<Call> Gestures() const
     {
         std::vector<Call> result;
@@ -78,22 +75,31 @@ protected:
         return result;
     }
 
-    HostWindow host{HostX, HostY, 500, 400};
+    TestWindow host{CRect(HostX, HostY, HostX + 500, HostY + 400)};
     RecordingScrollWnd wnd;
     DWORD base = 0;
 };
 
-// ---- clicks ----------------------------------------------------------------------------------
+// ---- clicks and double clicks ----------------------------------------------------------
 
 TEST_F(ScrolleeTest, ClickShorterThanHoldTimeIsReportedWithTheReleasesFlagsAndPoint)
 {
-    Input(LeftDown, CPoint(50, 60), 1000);
-    Input(LeftUp, CPoint(53, 64), 1299);
-    const std::vector<Call> expected = {{"Click", MK_LBUTTON, 0, {53, 64}, -1}};
-    EXPECT_EQ(Gestures(), expected);
-    // The click killed the hold timer: firing it late starts nothing.
-    FireHoldTimer();
-    EXPECT_EQ(Gestures(), expected);
+    // One press each, of different buttons, so that no two make a double click.
+    const struct { DWORD down, up; UINT button; } buttons[] = {
+        {LeftDown, LeftUp, MK_LBUTTON}, {RightDown, RightUp, MK_RBUTTON},
+        {MOUSEEVENTF_MIDDLEDOWN, MOUSEEVENTF_MIDDLEUP, MK_MBUTTON}};
+    DWORD time = 100;
+    for (const auto& b : buttons) {
+        SCOPED_TRACE(b.button);
+        wnd.Clear();
+        Input(b.down, CPoint(50, 60), time);
+        Input(b.up, CPoint(53, 64), time + 299);
+        const std::vector<Call> expected = {{"Click", b.button, 0, {53, 64}, -1}};
+        EXPECT_EQ(Gestures(), expected);
+        FireHoldTimer();   // killed by the click: starts nothing
+        EXPECT_EQ(Gestures(), expected);
+        time += 400;
+    }
 }
 
 TEST_F(ScrolleeTest, ReleaseAtHoldTimeBeforeTheTimerIsHandledReportsNothing)
@@ -104,76 +110,53 @@ TEST_F(ScrolleeTest, ReleaseAtHoldTimeBeforeTheTimerIsHandledReportsNothing)
     EXPECT_TRUE(Gestures().empty());
 }
 
-TEST_F(ScrolleeTest, RightAndMiddleButtonsReportTheirOwnKeyFlags)
-{
-    Input(RightDown, CPoint(10, 10), 1000);
-    Input(RightUp, CPoint(10, 10), 1010);
-    Input(MOUSEEVENTF_MIDDLEDOWN, CPoint(200, 10), 3000);
-    Input(MOUSEEVENTF_MIDDLEUP, CPoint(200, 10), 3010);
-    const std::vector<Call> expected = {
-        {"Click", MK_RBUTTON, 0, {10, 10}, -1},
-        {"Click", MK_MBUTTON, 0, {200, 10}, -1},
-    };
-    EXPECT_EQ(Gestures(), expected);
-}
-
 TEST_F(ScrolleeTest, SecondButtonWhileOneIsHeldIsIgnored)
 {
     Input(LeftDown, CPoint(30, 30), 1000);
     Input(RightDown, CPoint(30, 30), 1050);
     Input(RightUp, CPoint(30, 30), 1100);
     Input(LeftUp, CPoint(30, 30), 1150);
-    const std::vector<Call> expected = {{"Click", MK_LBUTTON, 0, {30, 30}, -1}};
+    EXPECT_EQ(Gestures(), (std::vector<Call>{{"Click", MK_LBUTTON, 0, {30, 30}, -1}}));
+}
+
+TEST_F(ScrolleeTest, PressReleaseDoubleClickReleaseIsAClickThenADoubleClick)
+{
+    Input(LeftDown, CPoint(40, 40), 1000);
+    Input(LeftUp, CPoint(40, 40), 1050);
+    Input(LeftDown, CPoint(40, 40), 1100);
+    FireHoldTimer();   // holding the second press starts no drag
+    Input(LeftUp, CPoint(40, 40), 1150);
+    const std::vector<Call> expected = {
+        {"Click", MK_LBUTTON, 0, {40, 40}, -1},
+        {"DoubleClick", MK_LBUTTON, MK_LBUTTON, {40, 40}, -1},
+    };
     EXPECT_EQ(Gestures(), expected);
 }
 
-// ---- drags ---------------------------------------------------------------------------------------
+// ---- drags ---------------------------------------------------------------------------------
 
-TEST_F(ScrolleeTest, HoldTimerStartsADragWithThePressFlagsAndPoint)
+TEST_F(ScrolleeTest, HoldTimerStartsADragWhoseMovesNeedAButtonFlag)
 {
     Input(LeftDown, CPoint(50, 60), 1000);
     Input(MoveOnly, CPoint(70, 80), 1100);   // moves before the drag are not reported
     FireHoldTimer();
-    Input(MoveOnly, CPoint(90, 95), 1400);
-    Input(LeftUp, CPoint(90, 95), 1500);
-
+    EXPECT_EQ(::GetCapture(), Scrollee());
+    ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(5, 6));
+    // Any of the three button flags will do; the pressed button is reported.
+    ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_RBUTTON, MAKELPARAM(7, 8));
+    Input(MoveOnly, CPoint(450, 60), 1400);   // outside the scrollee, inside the host
+    Input(LeftUp, CPoint(450, 60), 1500);
     const std::vector<Call> expected = {
-        {"DragStart", MK_LBUTTON, MK_LBUTTON, {50, 60}, -1},
-        {"DragMove", MK_LBUTTON, MK_LBUTTON, {90, 95}, -1},
-        {"DragEnd", MK_LBUTTON, 0, {90, 95}, 1},
+        {"DragStart", MK_LBUTTON, MK_LBUTTON, {50, 60}, -1}, {"DragMove", MK_LBUTTON, MK_RBUTTON, {7, 8}, -1},
+        {"DragMove", MK_LBUTTON, MK_LBUTTON, {450, 60}, -1}, {"DragEnd", MK_LBUTTON, 0, {450, 60}, 1},
     };
     EXPECT_EQ(Gestures(), expected);
     EXPECT_EQ(::GetCapture(), nullptr) << "the drag's capture is released";
 }
 
-TEST_F(ScrolleeTest, DragHoldsTheCaptureSoMovesOutsideAreReported)
-{
-    Input(LeftDown, CPoint(50, 60), 1000);
-    FireHoldTimer();
-    EXPECT_EQ(::GetCapture(), Scrollee());
-    Input(MoveOnly, CPoint(450, 60), 1400);   // outside the scrollee, inside the host
-    Input(LeftUp, CPoint(450, 60), 1500);
-    ASSERT_EQ(wnd.CallsNamed("DragMove").size(), 1u);
-    EXPECT_EQ(wnd.CallsNamed("DragMove")[0].point, CPoint(450, 60));
-    EXPECT_EQ(wnd.CallsNamed("DragEnd")[0].point, CPoint(450, 60));
-}
-
-TEST_F(ScrolleeTest, MoveWithoutAButtonFlagDuringADragIsNotReported)
-{
-    Input(LeftDown, CPoint(50, 60), 1000);
-    FireHoldTimer();
-    ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(5, 6));
-    EXPECT_TRUE(wnd.CallsNamed("DragMove").empty());
-    // Any of the three button flags will do; the pressed button is reported.
-    ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_RBUTTON, MAKELPARAM(7, 8));
-    const std::vector<Call> expected = {{"DragMove", MK_LBUTTON, MK_RBUTTON, {7, 8}, -1}};
-    EXPECT_EQ(wnd.CallsNamed("DragMove"), expected);
-    Input(LeftUp, CPoint(50, 60), 1500);
-}
-
 TEST_F(ScrolleeTest, AnotherWindowTakingTheCaptureEndsTheDragIncomplete)
 {
-    NotificationSink other(host.Handle());
+    TestWindow other(CRect(0, 0, 10, 10), host.Handle());
     Input(LeftDown, CPoint(50, 60), 1000);
     FireHoldTimer();
     ::SetCapture(other.Handle());
@@ -187,39 +170,24 @@ TEST_F(ScrolleeTest, AnotherWindowTakingTheCaptureEndsTheDragIncomplete)
     EXPECT_EQ(Gestures(), ended) << "the later release is ignored";
 }
 
-TEST_F(ScrolleeTest, ReleaseMouseDuringADragEndsItThroughTheCaptureLoss)
-{
-    Input(LeftDown, CPoint(50, 60), 1000);
-    FireHoldTimer();
-    wnd.GetScrollee()->ReleaseMouse();
-    ASSERT_EQ(wnd.CallsNamed("DragEnd").size(), 1u);
-    EXPECT_EQ(wnd.CallsNamed("DragEnd")[0], (Call{"DragEnd", MK_LBUTTON, 0, {0, 0}, 0}));
-    Input(LeftUp, CPoint(50, 60), 1500);
-    EXPECT_EQ(wnd.CallsNamed("DragEnd").size(), 1u);
-}
-
-TEST_F(ScrolleeTest, AbortDragForgetsTheDragWithoutEndingIt)
+TEST_F(ScrolleeTest, AbortDragForgetsTheDragOrThePressWithoutEndingIt)
 {
     Input(LeftDown, CPoint(50, 60), 1000);
     FireHoldTimer();
     wnd.AbortDrag();
     EXPECT_EQ(::GetCapture(), nullptr);
-    Input(MoveOnly, CPoint(60, 60), 1400);
-    Input(LeftUp, CPoint(60, 60), 1500);
+    Input(MoveOnly, CPoint(60, 60), 1100);
+    Input(LeftUp, CPoint(60, 60), 1200);
+    // Before the hold timer: the timer fired afterwards starts nothing.
+    Input(LeftDown, CPoint(150, 60), 1800);
+    wnd.AbortDrag();
+    FireHoldTimer();
+    Input(LeftUp, CPoint(150, 60), 1850);
     const std::vector<Call> expected = {
         {"DragStart", MK_LBUTTON, MK_LBUTTON, {50, 60}, -1},
         {"DragAbort", 0, 0, {0, 0}, -1},
+        {"DragAbort", 0, 0, {0, 0}, -1},
     };
-    EXPECT_EQ(Gestures(), expected);
-}
-
-TEST_F(ScrolleeTest, AbortDragBeforeTheHoldTimerLeavesTheTimerHarmless)
-{
-    Input(LeftDown, CPoint(50, 60), 1000);
-    wnd.AbortDrag();
-    FireHoldTimer();
-    Input(LeftUp, CPoint(50, 60), 1100);
-    const std::vector<Call> expected = {{"DragAbort", 0, 0, {0, 0}, -1}};
     EXPECT_EQ(Gestures(), expected);
 }
 
@@ -234,156 +202,49 @@ TEST_F(ScrolleeTest, PressWhileTheScrolleeHoldsItsOwnCaptureReportsNothing)
     EXPECT_TRUE(Gestures().empty());
 }
 
-// ---- double clicks -------------------------------------------------------------------------------
-
-TEST_F(ScrolleeTest, PressReleaseDoubleClickReleaseIsAClickThenADoubleClick)
-{
-    Input(LeftDown, CPoint(40, 40), 1000);
-    Input(LeftUp, CPoint(40, 40), 1050);
-    Input(LeftDown, CPoint(40, 40), 1100);
-    Input(LeftUp, CPoint(40, 40), 1150);
-    const std::vector<Call> expected = {
-        {"Click", MK_LBUTTON, 0, {40, 40}, -1},
-        {"DoubleClick", MK_LBUTTON, MK_LBUTTON, {40, 40}, -1},
-    };
-    EXPECT_EQ(Gestures(), expected);
-}
-
-TEST_F(ScrolleeTest, HoldingTheSecondPressOfADoubleClickStartsNoDrag)
-{
-    Input(LeftDown, CPoint(40, 40), 1000);
-    Input(LeftUp, CPoint(40, 40), 1050);
-    Input(LeftDown, CPoint(40, 40), 1100);
-    FireHoldTimer();
-    Input(LeftUp, CPoint(40, 40), 1900);
-    EXPECT_TRUE(wnd.CallsNamed("DragStart").empty());
-    EXPECT_EQ(wnd.CallsNamed("DoubleClick").size(), 1u);
-    EXPECT_EQ(Gestures().size(), 2u);
-}
-
-// ---- painting ---------------------------------------------------------------------------------------
+// ---- painting and resting --------------------------------------------------------------------
 
 TEST_F(ScrolleeTest, EraseFillsBlackUntilABackgroundColourIsSet)
 {
-    const auto fillWhite = [this] {
+    const auto repaintOverWhite = [this] {
         HDC dc = ::GetDC(Scrollee());
-        RECT all = {0, 0, WndWidth, WndHeight};
+        const RECT all = {0, 0, WndWidth, WndHeight};
         ::FillRect(dc, &all, static_cast<HBRUSH>(::GetStockObject(WHITE_BRUSH)));
         ::ReleaseDC(Scrollee(), dc);
+        ::InvalidateRect(Scrollee(), nullptr, TRUE);
+        ::UpdateWindow(Scrollee());
     };
-    fillWhite();
-    ::InvalidateRect(Scrollee(), nullptr, TRUE);
-    ::UpdateWindow(Scrollee());
-    Pixels black(Scrollee(), WndWidth, WndHeight);
-    EXPECT_EQ(black.At(0, 0), RGB(0, 0, 0));
-    EXPECT_EQ(black.At(WndWidth / 2, WndHeight / 2), RGB(0, 0, 0));
-    EXPECT_EQ(black.At(WndWidth - 1, WndHeight - 1), RGB(0, 0, 0));
-
+    // Filled and outlined alike, edges included.
+    const CPoint probes[] = {{0, 0}, {WndWidth / 2, WndHeight / 2}, {WndWidth - 1, 0}, {WndWidth - 1, WndHeight - 1}};
+    repaintOverWhite();
+    for (CPoint probe : probes)
+        EXPECT_EQ(PixelAt(Scrollee(), probe.x, probe.y), RGB(0, 0, 0)) << testing::PrintToString(probe);
     const COLORREF colour = RGB(0, 128, 255);
     wnd.GetScrollee()->SetBackgroundColor(colour);
-    Pixels unchanged(Scrollee(), WndWidth, WndHeight);
-    EXPECT_EQ(unchanged.At(10, 10), RGB(0, 0, 0)) << "setting the colour repaints nothing";
-
-    fillWhite();
-    ::InvalidateRect(Scrollee(), nullptr, TRUE);
-    ::UpdateWindow(Scrollee());
-    Pixels coloured(Scrollee(), WndWidth, WndHeight);
-    // Filled and outlined with the colour, edges included.
-    EXPECT_EQ(coloured.At(0, 0), colour);
-    EXPECT_EQ(coloured.At(WndWidth / 2, WndHeight / 2), colour);
-    EXPECT_EQ(coloured.At(WndWidth - 1, 0), colour);
-    EXPECT_EQ(coloured.At(WndWidth - 1, WndHeight - 1), colour);
-}
-
-TEST_F(ScrolleeTest, PaintCallsOnDrawWithTheScrolleeAndAnMmTextContext)
-{
-    Tavo_WiScrollee* painted = nullptr;
-    int mapMode = 0;
-    wnd.painter = [&](Tavo_WiScrollee* scrollee, CDC* dc) {
-        painted = scrollee;
-        mapMode = ::GetMapMode(dc->GetSafeHdc());
-        dc->FillSolidRect(0, 0, 10, 10, RGB(255, 0, 0));
-    };
-    ::InvalidateRect(Scrollee(), nullptr, TRUE);
-    ::UpdateWindow(Scrollee());
-    EXPECT_EQ(painted, wnd.GetScrollee());
-    EXPECT_EQ(mapMode, MM_TEXT);
-    Pixels pixels(Scrollee(), WndWidth, WndHeight);
-    EXPECT_EQ(pixels.At(5, 5), RGB(255, 0, 0));
-    EXPECT_EQ(pixels.At(20, 20), RGB(0, 0, 0)) << "erased before the paint";
-}
-
-// ---- parked cursor ------------------------------------------------------------------------------------
-
-TEST_F(ScrolleeTest, RestStartShowsTheDataTipTextAtThePointer)
-{
-    wnd.dataTipText = "tip text";
-    ::SetCursorPos(HostX + 40, HostY + 50);
-    const LRESULT result =
-        ::SendMessageA(Scrollee(), Tavo_WiParkedCursorMonitor::GetNotifyMsg(), 1, 0);
-    EXPECT_EQ(result, 1);
-    ASSERT_EQ(wnd.CallsNamed("ParkedStart").size(), 1u);
-    EXPECT_EQ(wnd.CallsNamed("ParkedStart")[0].point, CPoint(40, 50));
-    EXPECT_EQ(wnd.CallsNamed("DataTipText")[0].point, CPoint(40, 50));
-    Tavo_WiDataTip* tip = wnd.GetScrollee()->GetDataTip();
-    EXPECT_EQ(tip->IsVisible(), 1);
-    EXPECT_TRUE(::IsWindowVisible(tip->GetSafeHwnd()));
-
-    EXPECT_EQ(::SendMessageA(Scrollee(), Tavo_WiParkedCursorMonitor::GetNotifyMsg(), 0, 0), 1);
-    EXPECT_EQ(wnd.CallsNamed("ParkedEnd").size(), 1u);
-    EXPECT_EQ(tip->IsVisible(), 0);
-    EXPECT_FALSE(::IsWindowVisible(tip->GetSafeHwnd()));
-}
-
-TEST_F(ScrolleeTest, RestWithAnEmptyTextShowsNoTip)
-{
-    ::SetCursorPos(HostX + 40, HostY + 50);
-    ::SendMessageA(Scrollee(), Tavo_WiParkedCursorMonitor::GetNotifyMsg(), 1, 0);
-    EXPECT_EQ(wnd.CallsNamed("DataTipText").size(), 1u);
-    EXPECT_EQ(wnd.GetScrollee()->GetDataTip()->IsVisible(), 0);
+    EXPECT_EQ(PixelAt(Scrollee(), 0, 0), RGB(0, 0, 0)) << "setting the colour repaints nothing";
+    repaintOverWhite();
+    for (CPoint probe : probes)
+        EXPECT_EQ(PixelAt(Scrollee(), probe.x, probe.y), colour) << testing::PrintToString(probe);
 }
 
 TEST_F(ScrolleeTest, PreTranslatedMovesReachTheMonitorAndARestShowsTheTip)
 {
     wnd.dataTipText = "resting";
     Input(MoveOnly, CPoint(60, 70), 1000);
-    const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
-    ASSERT_NE(monitor, nullptr);
-    ::SendMessageA(monitor, WM_TIMER, Tavo_WiParkedCursorMonitor::ParkTimerId, 0);
-    ASSERT_EQ(wnd.CallsNamed("ParkedStart").size(), 1u);
-    EXPECT_EQ(wnd.CallsNamed("ParkedStart")[0].point, CPoint(60, 70));
-    EXPECT_EQ(wnd.GetScrollee()->GetDataTip()->IsVisible(), 1);
+    ::SendMessageA(::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId), WM_TIMER,
+                   Tavo_WiParkedCursorMonitor::ParkTimerId, 0);
+    const std::vector<Call> started = {{"ParkedStart", 0, 0, {60, 70}, -1}, {"DataTipText", 0, 0, {60, 70}, -1}};
+    EXPECT_EQ(wnd.calls, started);
+    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
+    EXPECT_TRUE(::IsWindowVisible(tip));
 
     // The next move to another point ends the rest and hides the tip.
     Input(MoveOnly, CPoint(61, 70), 1200);
     EXPECT_EQ(wnd.CallsNamed("ParkedEnd").size(), 1u);
-    EXPECT_EQ(wnd.GetScrollee()->GetDataTip()->IsVisible(), 0);
-}
-
-TEST_F(ScrolleeTest, SwitchedOffMonitorReportsNoRest)
-{
-    wnd.SetParkedCursorMonitorFlag(0);
-    Input(MoveOnly, CPoint(60, 70), 1000);
-    const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
-    ::SendMessageA(monitor, WM_TIMER, Tavo_WiParkedCursorMonitor::ParkTimerId, 0);
-    EXPECT_TRUE(wnd.CallsNamed("ParkedStart").empty());
-}
-
-// ---- windows ------------------------------------------------------------------------------------------
-
-TEST_F(ScrolleeTest, ScrolleeOwnsItsMonitorAndDataTipWindows)
-{
-    const HWND monitor = ::GetDlgItem(Scrollee(), 2000);
-    ASSERT_NE(monitor, nullptr);
-    EXPECT_FALSE(::IsWindowVisible(monitor));
-    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
-    ASSERT_NE(tip, nullptr);
     EXPECT_FALSE(::IsWindowVisible(tip));
-
-    EXPECT_TRUE(wnd.GetScrollee()->DestroyWindow());
-    EXPECT_FALSE(::IsWindow(monitor));
-    EXPECT_FALSE(::IsWindow(tip));
 }
+
+// ---- window classes --------------------------------------------------------------------------
 
 std::string ClassOf(HWND hwnd)
 {
@@ -392,41 +253,36 @@ std::string ClassOf(HWND hwnd)
     return name;
 }
 
-TEST_F(ScrolleeTest, UnderEnglishTheLibrarysOwnClassesAreUsed)
+TEST_F(ScrolleeTest, WindowsUseTheLibrarysOwnClassesUnderEnglishOnly)
 {
-    if (!EnglishLocale())
-        GTEST_SKIP() << "the user's default locale is not English";
-    EXPECT_EQ(ClassOf(Scrollee()), "Tavo_WiScrollee");
-    EXPECT_EQ(::GetClassLongPtrA(Scrollee(), GCL_STYLE), static_cast<ULONG_PTR>(CS_DBLCLKS | CS_PARENTDC));
-    EXPECT_EQ(reinterpret_cast<HBRUSH>(::GetClassLongPtrA(Scrollee(), GCLP_HBRBACKGROUND)),
-              static_cast<HBRUSH>(::GetStockObject(BLACK_BRUSH)));
-    EXPECT_EQ(ClassOf(wnd.GetSafeHwnd()), "Tavo_WiScrollWnd");
-    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCL_STYLE), static_cast<ULONG_PTR>(CS_DBLCLKS | CS_PARENTDC));
-    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HBRBACKGROUND), 0u);
-    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HCURSOR), 0u);
-    const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
-    EXPECT_EQ(ClassOf(monitor), "Tavo_WiParkedCursorWnd");
-    EXPECT_EQ(::GetClassLongPtrA(monitor, GCL_STYLE), static_cast<ULONG_PTR>(CS_PARENTDC));
     const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
-    EXPECT_EQ(ClassOf(tip), "Tavo_WiDataTip");
-    EXPECT_EQ(::GetClassLongPtrA(tip, GCL_STYLE), static_cast<ULONG_PTR>(CS_SAVEBITS | CS_DBLCLKS));
-    EXPECT_NE(::GetClassLongPtrA(tip, GCLP_HBRBACKGROUND), 0u);
-    EXPECT_EQ(reinterpret_cast<HCURSOR>(::GetClassLongPtrA(tip, GCLP_HCURSOR)), ::LoadCursor(nullptr, IDC_ARROW));
-}
-
-TEST_F(ScrolleeTest, UnderAnotherLanguageTheFrameworksDefaultClassIsUsed)
-{
-    if (EnglishLocale())
-        GTEST_SKIP() << "the user's default locale is English";
-    for (HWND hwnd : {wnd.GetSafeHwnd(), Scrollee(), ::GetDlgItem(Scrollee(), 2000),
-                      wnd.GetScrollee()->GetDataTip()->GetSafeHwnd()}) {
-        ASSERT_NE(hwnd, nullptr);
-        EXPECT_EQ(ClassOf(hwnd).rfind("Tavo_Wi", 0), std::string::npos) << ClassOf(hwnd);
+    const struct { HWND hwnd; const char* name; ULONG_PTR style; } windows[] = {
+        {wnd.GetSafeHwnd(), "Tavo_WiScrollWnd", CS_DBLCLKS | CS_PARENTDC},
+        {Scrollee(), "Tavo_WiScrollee", CS_DBLCLKS | CS_PARENTDC},
+        {::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId), "Tavo_WiParkedCursorWnd", CS_PARENTDC},
+        {tip, "Tavo_WiDataTip", CS_SAVEBITS | CS_DBLCLKS},
+    };
+    for (const auto& w : windows) {
+        SCOPED_TRACE(w.name);
+        ASSERT_NE(w.hwnd, nullptr);
+        if (!EnglishLocale()) {
+            EXPECT_EQ(ClassOf(w.hwnd).rfind("Tavo_Wi", 0), std::string::npos) << ClassOf(w.hwnd);
+            continue;
+        }
+        EXPECT_EQ(ClassOf(w.hwnd), w.name);
+        EXPECT_EQ(::GetClassLongPtrA(w.hwnd, GCL_STYLE), w.style);
     }
-    // The tip still carries its border and tool-window style.
-    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
+    // The tip carries its border and tool-window style under either.
     EXPECT_NE(::GetWindowLongA(tip, GWL_EXSTYLE) & WS_EX_TOOLWINDOW, 0);
     EXPECT_NE(::GetWindowLongA(tip, GWL_STYLE) & WS_BORDER, 0);
+    if (!EnglishLocale())
+        return;
+    EXPECT_EQ(reinterpret_cast<HBRUSH>(::GetClassLongPtrA(Scrollee(), GCLP_HBRBACKGROUND)),
+              static_cast<HBRUSH>(::GetStockObject(BLACK_BRUSH)));
+    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HBRBACKGROUND), 0u);
+    EXPECT_EQ(::GetClassLongPtrA(wnd.GetSafeHwnd(), GCLP_HCURSOR), 0u);
+    EXPECT_NE(::GetClassLongPtrA(tip, GCLP_HBRBACKGROUND), 0u);
+    EXPECT_EQ(reinterpret_cast<HCURSOR>(::GetClassLongPtrA(tip, GCLP_HCURSOR)), ::LoadCursor(nullptr, IDC_ARROW));
 }
 
 TEST(ScrollLocale, ProcessRunsUnderTheExpectedLanguage)

@@ -1,9 +1,10 @@
 // Tavo_WiScrollWnd: the scroll model as the real scroll bars show it, every
-// scroll code, ScrollWindowTest, drag-scroll sequencing, the layout of the
-// children and the moving of pixels.
+// scroll code, ScrollWindowTest, drag scrolling, the layout of the children,
+// the moving of pixels and the destruction of the window family.
 #include "scroll_test_support.h"
 
 #include "Tavo_WiDataTip.h"
+#include "Tavo_WiParkedCursorMonitor.h"
 #include "Tavo_WiScrollMath.h"
 
 #include <gtest/gtest.h>
@@ -11,19 +12,19 @@
 #include <climits>
 
 using namespace ScrollTest;
+using Tavo_WiScroll::Down;
+using Tavo_WiScroll::Left;
+using Tavo_WiScroll::Right;
+using Tavo_WiScroll::Up;
 
 namespace {
 
-constexpr int HostX = 100;
-constexpr int HostY = 100;
 constexpr int WndWidth = 400;
 constexpr int WndHeight = 300;
 
 SCROLLINFO BarInfo(HWND bar)
 {
-    SCROLLINFO info = {};
-    info.cbSize = sizeof info;
-    info.fMask = SIF_ALL;
+    SCROLLINFO info = {sizeof info, SIF_ALL, 0, 0, 0, 0, 0};
     ::GetScrollInfo(bar, SB_CTL, &info);
     return info;
 }
@@ -59,75 +60,98 @@ protected:
         wnd.Clear();
     }
 
-    void SendHScroll(UINT code, int n = 0)
+    // A WM_HSCROLL or WM_VSCROLL from the matching bar.
+    void SendScroll(UINT message, UINT code, int n = 0)
     {
-        ::SendMessageA(wnd.GetSafeHwnd(), WM_HSCROLL, MAKEWPARAM(code, n),
-                       reinterpret_cast<LPARAM>(HorzBar()));
+        const HWND bar = message == WM_HSCROLL ? HorzBar() : VertBar();
+        ::SendMessageA(wnd.GetSafeHwnd(), message, MAKEWPARAM(code, n), reinterpret_cast<LPARAM>(bar));
     }
 
-    void SendVScroll(UINT code, int n = 0)
-    {
-        ::SendMessageA(wnd.GetSafeHwnd(), WM_VSCROLL, MAKEWPARAM(code, n),
-                       reinterpret_cast<LPARAM>(VertBar()));
-    }
-
-    HostWindow host{HostX, HostY, 500, 400};
+    TestWindow host{CRect(100, 100, 600, 500)};
     RecordingScrollWnd wnd;
 };
 
-// ---- construction and children ----------------------------------------------------
+// ---- the scroll model on the bars ----------------------------------------------------
 
-TEST_F(ScrollWndTest, CreateMakesTheFourChildrenWithTheirIdsAndStyles)
+TEST(ScrollMath, BarUnitsRoundAwayFromZeroUnlessWhole)
 {
-    ASSERT_NE(Scrollee(), nullptr);
-    EXPECT_EQ(::GetDlgCtrlID(Scrollee()), 1000);
-    EXPECT_EQ(static_cast<DWORD>(::GetWindowLongA(Scrollee(), GWL_STYLE)) & 0xFFFF0000u, 0x54000000u);
-    ASSERT_NE(HorzBar(), nullptr);
-    EXPECT_EQ(static_cast<DWORD>(::GetWindowLongA(HorzBar(), GWL_STYLE)) & 0xF000000Fu, 0x50000000u);
-    ASSERT_NE(VertBar(), nullptr);
-    EXPECT_EQ(static_cast<DWORD>(::GetWindowLongA(VertBar(), GWL_STYLE)) & 0xF000000Fu, 0x50000001u);
-    ASSERT_NE(Corner(), nullptr);
-    char cls[64] = {};
-    ::GetClassNameA(Corner(), cls, sizeof cls);
-    EXPECT_STRCASEEQ(cls, "Button");
+    const struct { int value; double scale; int expected; } cases[] = {
+        {3, 2.0, 2},   {4, 2.0, 2}, {5, 2.0, 3},           {-3, 2.0, -2},         {-4, 2.0, -2},
+        {-5, 2.0, -3}, {0, 2.0, 0}, {INT_MAX, 1.0, INT_MAX}, {INT_MIN, 1.0, INT_MIN}};
+    for (const auto& c : cases)
+        EXPECT_EQ(Tavo_WiScrollMath::ToBarUnits(c.value, c.scale), c.expected) << c.value << " / " << c.scale;
 }
 
-TEST_F(ScrollWndTest, ChildrenKeepTheirInitialRectangleUntilTheFirstLayout)
+TEST_F(ScrollWndTest, BarsHoldTheRangeScaledToTheirLimitWithItsEndsRoundedOutwards)
 {
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, 10, 10));
-    EXPECT_EQ(ChildRect(HorzBar()), CRect(0, 0, 10, 10));
-}
-
-TEST_F(ScrollWndTest, DestroyWindowTakesTheChildrenAndTheScrolleesWindowsWithIt)
-{
-    const HWND self = wnd.GetSafeHwnd();
-    const HWND scrollee = Scrollee();
-    const HWND monitor = ::GetDlgItem(scrollee, 2000);
-    ASSERT_NE(monitor, nullptr);
-    EXPECT_TRUE(wnd.DestroyWindow());
-    EXPECT_FALSE(::IsWindow(self));
-    EXPECT_FALSE(::IsWindow(scrollee));
-    EXPECT_FALSE(::IsWindow(monitor));
-    EXPECT_EQ(wnd.GetSafeHwnd(), nullptr);
-    EXPECT_FALSE(wnd.DestroyWindow()) << "a second DestroyWindow finds no window";
-}
-
-TEST_F(ScrollWndTest, DestructorAloneLeavesNoWindowBehind)
-{
-    std::vector<HWND> windows;
-    {
-        RecordingScrollWnd other;
-        ASSERT_TRUE(other.Create(WS_CHILD | WS_VISIBLE, CRect(0, 0, 100, 100), host.Wnd(), 78));
-        const HWND scrollee = other.GetScrollee()->GetSafeHwnd();
-        windows = {other.GetSafeHwnd(), scrollee, ::GetDlgItem(scrollee, 2000),
-                   other.GetScrollee()->GetDataTip()->GetSafeHwnd(),
-                   ::GetDlgItem(other.GetSafeHwnd(), 1001), ::GetDlgItem(other.GetSafeHwnd(), 1002),
-                   ::GetDlgItem(other.GetSafeHwnd(), 1003)};
-        for (HWND hwnd : windows)
-            ASSERT_TRUE(::IsWindow(hwnd));
+    // Ranges as (x minimum, y minimum, x maximum, y maximum), the bars' likewise.
+    const struct { CRect range, bars; CPoint lowest, highest; } cases[] = {
+        // Twice the bar limit: scale 2.0 on x only.
+        {{0, 0, 2 * 32767, 100}, {0, 0, 32767, 100}, {0, 0}, {2 * 32767, 100}},
+        // Empty and reversed ranges are 100 units wide.
+        {{5, 0, 5, 0}, {5, 0, 105, 100}, {5, 0}, {105, 100}},
+        {{5, 0, 2, 0}, {5, 0, 105, 100}, {5, 0}, {105, 100}},
+        // Scale 2.0 on both: 3 is bar unit 2 and stored as 4, -3 is bar unit -2
+        // and stored as -4, 65537 is 32769 and stored as 65538.
+        {{3, -3, 65537, 65531}, {2, -2, 32769, 32766}, {4, -4}, {65538, 65532}},
+    };
+    wnd.SetScrollWindowExtent(0, 0);
+    for (const auto& c : cases) {
+        SCOPED_TRACE(testing::PrintToString(c.range));
+        wnd.SetScrollRange(c.range.left, c.range.right, c.range.top, c.range.bottom);
+        const SCROLLINFO h = BarInfo(HorzBar());
+        const SCROLLINFO v = BarInfo(VertBar());
+        EXPECT_EQ(CRect(h.nMin, v.nMin, h.nMax, v.nMax), c.bars);
+        wnd.ScrollWindowTo(CPoint(INT_MIN, INT_MIN));
+        EXPECT_EQ(wnd.GetScrollPosition(), c.lowest);
+        wnd.ScrollWindowTo(CPoint(INT_MAX, INT_MAX));
+        EXPECT_EQ(wnd.GetScrollPosition(), c.highest);
     }
-    for (HWND hwnd : windows)
-        EXPECT_FALSE(::IsWindow(hwnd));
+    // Extreme ranges saturate instead of wrapping.
+    wnd.SetScrollRange(INT_MIN, INT_MAX, INT_MAX - 10, INT_MAX - 20);
+    wnd.SetScrollWindowExtent(100, 100);
+    wnd.ScrollWindowTo(CPoint(INT_MAX, INT_MAX));
+    EXPECT_GT(wnd.GetScrollPosition().x, INT_MAX - 200000);
+    EXPECT_GT(wnd.GetScrollPosition().y, INT_MAX - 200);
+}
+
+TEST_F(ScrollWndTest, ThumbPositionsMapBackFromBarUnitsBeyondSixteenBits)
+{
+    // Scale 2.0 on x: a window of 200 units is a page of 100 bar units and
+    // position 1000 is bar position 500.
+    wnd.SetScrollRange(0, 2 * 32767, 0, 100);
+    wnd.SetScrollWindowExtent(200, 10);
+    wnd.SetScrollPosition(CPoint(1000, 7));
+    const SCROLLINFO h = BarInfo(HorzBar());
+    const SCROLLINFO v = BarInfo(VertBar());
+    EXPECT_EQ(h.nPage, 100u);
+    EXPECT_EQ(h.nPos, 500);
+    EXPECT_EQ(v.nPage, 10u);
+    EXPECT_EQ(v.nPos, 7);
+    SendScroll(WM_HSCROLL, SB_THUMBTRACK, 1234);
+    EXPECT_EQ(wnd.GetScrollPosition().x, 2468);
+    SendScroll(WM_HSCROLL, SB_ENDSCROLL);
+
+    // Bar ranges of -2 .. 32766 (scale 2.0) and 200000 .. 230000: the message
+    // carries the low 16 bits of the thumb position only.
+    wnd.SetScrollRange(-3, 65531, 200000, 230000);
+    wnd.SetScrollWindowExtent(0, 0);
+    wnd.SetScrollPosition(CPoint(1000, 200000));
+    SendScroll(WM_HSCROLL, SB_THUMBTRACK, 0xFFFF & -2);
+    EXPECT_EQ(wnd.GetScrollPosition().x, -4);
+    SendScroll(WM_VSCROLL, SB_THUMBTRACK, 0xFFFF & 210000);
+    EXPECT_EQ(wnd.GetScrollPosition().y, 210000);
+}
+
+TEST_F(ScrollWndTest, WindowLargerThanTheRangeEndsBeforeTheMinimumOrInvertedAtTheMaximumY)
+{
+    for (int inverted : {0, 1}) {
+        wnd.SetScrollInvertedY(inverted);
+        wnd.SetScrollRange(0, 100, 0, 100);
+        wnd.SetScrollWindowExtent(150, 150);
+        wnd.ScrollWindowTo(CPoint(10, 10));
+        EXPECT_EQ(wnd.GetScrollPosition(), inverted ? CPoint(-50, 100) : CPoint(-50, -50));
+    }
 }
 
 TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
@@ -139,232 +163,55 @@ TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
     unborn.SetScrollPosition(CPoint(2000, -5));
     unborn.SetScrollDone();
     EXPECT_EQ(unborn.GetScrollPosition(), CPoint(900, 0));
-    unborn.ScrollWindow(Tavo_WiScroll::Left, Tavo_WiScroll::Page, 0);
+    unborn.ScrollWindow(Left, Tavo_WiScroll::Page, 0);
     EXPECT_EQ(unborn.GetScrollPosition(), CPoint(850, 0));
-    EXPECT_TRUE(unborn.ScrollWindowTest(Tavo_WiScroll::Down, Tavo_WiScroll::Limit, 0));
+    // Unknown directions and amounts do nothing at all.
+    unborn.Clear();
+    unborn.ScrollWindow(static_cast<Tavo_WiScroll::Dir>(4), Tavo_WiScroll::Line, 0);
+    unborn.ScrollWindow(Left, static_cast<Tavo_WiScroll::Amount>(-1), 0);
+    EXPECT_EQ(unborn.GetScrollPosition(), CPoint(850, 0));
+    EXPECT_TRUE(unborn.calls.empty());
+    EXPECT_TRUE(unborn.ScrollWindowTest(Down, Tavo_WiScroll::Limit, 0));
     unborn.AbortDrag();
     unborn.OnParkedCursorEnd();
     EXPECT_EQ(unborn.GetSafeHwnd(), nullptr);
 }
 
-TEST(ScrollWndWithoutWindow, UnknownDirectionOrAmountDoesNothing)
+// ---- scroll codes and steps ------------------------------------------------------------
+
+TEST_F(ScrollWndTest, EveryScrollCodeMovesToItsTargetAndTheBarShowsIt)
 {
-    RecordingScrollWnd unborn;
-    unborn.SetScrollRange(0, 1000, 0, 1000);
-    unborn.SetScrollPosition(CPoint(500, 500));
-    unborn.Clear();
-    unborn.ScrollWindow(static_cast<Tavo_WiScroll::Dir>(4), Tavo_WiScroll::Line, 0);
-    unborn.ScrollWindow(Tavo_WiScroll::Left, static_cast<Tavo_WiScroll::Amount>(-1), 0);
-    EXPECT_EQ(unborn.GetScrollPosition(), CPoint(500, 500));
-    EXPECT_TRUE(unborn.calls.empty());
-}
-
-// ---- the scroll model on the bars -----------------------------------------------------
-
-TEST_F(ScrollWndTest, BeforeAnyRangeThePositionClampsToTheConstructedRange)
-{
-    wnd.ScrollWindowTo(CPoint(50, 50));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(0, 100));
-}
-
-TEST_F(ScrollWndTest, RangeOfTwiceTheBarLimitIsHalvedOnTheHorizontalBar)
-{
-    wnd.SetScrollRange(0, 2 * 32767, 0, 100);
-    SCROLLINFO h = BarInfo(HorzBar());
-    EXPECT_EQ(h.nMin, 0);
-    EXPECT_EQ(h.nMax, 32767);
-    SCROLLINFO v = BarInfo(VertBar());
-    EXPECT_EQ(v.nMin, 0);
-    EXPECT_EQ(v.nMax, 100);
-
-    // Scale 2.0: a window of 200 units is a page of 100 bar units, and the
-    // position 1000 is bar position 500; the vertical bar keeps scale 1.
-    wnd.SetScrollWindowExtent(200, 10);
-    EXPECT_EQ(BarInfo(HorzBar()).nPage, 100u);
-    EXPECT_EQ(BarInfo(VertBar()).nPage, 10u);
-    wnd.SetScrollPosition(CPoint(1000, 7));
-    EXPECT_EQ(BarInfo(HorzBar()).nPos, 500);
-    EXPECT_EQ(BarInfo(VertBar()).nPos, 7);
-
-    // The stored x range is 0 .. 65534 scroll units.
-    wnd.ScrollWindowTo(CPoint(INT_MAX, 0));
-    EXPECT_EQ(wnd.GetScrollPosition().x, 2 * 32767 - 200);
-}
-
-TEST_F(ScrollWndTest, EmptyOrReversedRangeIsOneHundredUnitsWide)
-{
-    wnd.SetScrollRange(5, 5, 0, 0);
-    EXPECT_EQ(BarInfo(HorzBar()).nMin, 5);
-    EXPECT_EQ(BarInfo(HorzBar()).nMax, 105);
-    EXPECT_EQ(BarInfo(VertBar()).nMin, 0);
-    EXPECT_EQ(BarInfo(VertBar()).nMax, 100);
-
-    wnd.SetScrollRange(5, 2, 0, 0);
-    EXPECT_EQ(BarInfo(HorzBar()).nMax, 105);
-    EXPECT_EQ(BarInfo(VertBar()).nMax, 100);
-}
-
-TEST_F(ScrollWndTest, ScaledRangeEndsRoundOutwardsToWholeBarUnits)
-{
-    // Scale 2.0 on x: 3 is bar unit 2 and stored as 4; the end 65537 is bar
-    // unit 32769 and stored as 65538.
-    wnd.SetScrollRange(3, 65537, -3, 65531);
-    SCROLLINFO h = BarInfo(HorzBar());
-    EXPECT_EQ(h.nMin, 2);
-    EXPECT_EQ(h.nMax, 32769);
-    // Scale 2.0 on y too: -3 is bar unit -2 and stored as -4.
-    SCROLLINFO v = BarInfo(VertBar());
-    EXPECT_EQ(v.nMin, -2);
-    EXPECT_EQ(v.nMax, 32766);
-
-    wnd.SetScrollWindowExtent(0, 0);
-    wnd.ScrollWindowTo(CPoint(INT_MIN, INT_MIN));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(4, -4));
-    wnd.ScrollWindowTo(CPoint(INT_MAX, INT_MAX));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(65538, 65532));
-}
-
-TEST_F(ScrollWndTest, BarUnitsRoundAwayFromZeroUnlessWhole)
-{
-    using Tavo_WiScrollMath::ToBarUnits;
-    EXPECT_EQ(ToBarUnits(3, 2.0), 2);
-    EXPECT_EQ(ToBarUnits(4, 2.0), 2);
-    EXPECT_EQ(ToBarUnits(5, 2.0), 3);
-    EXPECT_EQ(ToBarUnits(-3, 2.0), -2);
-    EXPECT_EQ(ToBarUnits(0, 2.0), 0);
-    EXPECT_EQ(ToBarUnits(-17, 1.0), -17);
-    EXPECT_EQ(ToBarUnits(INT_MAX, 1.0), INT_MAX);
-    EXPECT_EQ(ToBarUnits(INT_MIN, 1.0), INT_MIN);
-}
-
-TEST_F(ScrollWndTest, ExtremeRangeSaturatesInsteadOfWrapping)
-{
-    wnd.SetScrollRange(INT_MIN, INT_MAX, INT_MAX - 10, INT_MAX - 20);
-    wnd.SetScrollWindowExtent(100, 100);
-    wnd.ScrollWindowTo(CPoint(INT_MAX, INT_MAX));
-    EXPECT_GT(wnd.GetScrollPosition().x, INT_MAX - 200000);
-    EXPECT_GT(wnd.GetScrollPosition().y, INT_MAX - 200);
-}
-
-TEST_F(ScrollWndTest, NormalModeWindowLargerThanRangeEndsBeforeTheMinimum)
-{
-    wnd.SetScrollRange(0, 100, 0, 100);
-    wnd.SetScrollWindowExtent(150, 150);
-    wnd.ScrollWindowTo(CPoint(10, 10));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(-50, -50));
-}
-
-TEST_F(ScrollWndTest, InvertedModeWindowLargerThanRangeEndsAtTheMaximumY)
-{
-    wnd.SetScrollInvertedY(1);
-    wnd.SetScrollRange(0, 100, 0, 100);
-    wnd.SetScrollWindowExtent(150, 150);
-    wnd.ScrollWindowTo(CPoint(10, 10));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(-50, 100));
-}
-
-TEST_F(ScrollWndTest, InvertedModeKeepsTheTopOfTheRangeAtTheTopOfTheBar)
-{
-    wnd.SetScrollInvertedY(1);
-    wnd.SetScrollRange(0, 1000, 0, 1000);
-    wnd.SetScrollWindowExtent(100, 100);
-    wnd.SetScrollPosition(CPoint(0, 1000));
-    EXPECT_EQ(BarInfo(VertBar()).nPos, 0);
-    wnd.SetScrollPosition(CPoint(0, 300));
-    EXPECT_EQ(BarInfo(VertBar()).nPos, 700);
-    wnd.SetScrollPosition(CPoint(0, 50));
-    EXPECT_EQ(wnd.GetScrollPosition().y, 100) << "clamped to minimum y + extent height";
-}
-
-TEST_F(ScrollWndTest, ScrollDeltasHaveTheirMinimumsAndPageComesFirst)
-{
-    SetSquareModel(CPoint(500, 500));
-    wnd.SetScrollDeltas(CSize(1, 1), CSize(0, 0));
-    SendHScroll(SB_LINERIGHT);
-    EXPECT_EQ(wnd.GetScrollPosition().x, 501);
-    SendHScroll(SB_PAGERIGHT);
-    EXPECT_EQ(wnd.GetScrollPosition().x, 503);
-}
-
-// ---- scroll codes ------------------------------------------------------------------------
-
-struct CodeCase
-{
-    UINT code;
-    int n;
-    int expected;
-};
-
-TEST_F(ScrollWndTest, EveryHorizontalCodeMovesToItsTarget)
-{
-    const CodeCase cases[] = {
-        {SB_LINELEFT, 0, 490},  {SB_LINERIGHT, 0, 510}, {SB_PAGELEFT, 0, 450},
-        {SB_PAGERIGHT, 0, 550}, {SB_THUMBTRACK, 200, 200}, {SB_THUMBPOSITION, 321, 321},
-        {SB_LEFT, 0, 0},        {SB_RIGHT, 0, 900},     {100, 25, 475},
-        {101, 25, 525},         {42, 0, 500},
+    constexpr UINT H = WM_HSCROLL;
+    constexpr UINT V = WM_VSCROLL;
+    const struct { UINT message; int inverted; UINT code; int n; int expected; } cases[] = {
+        // 100 and 101 step back and forward by n percent of the window extent.
+        {H, 0, SB_LINELEFT, 0, 490},   {H, 0, SB_LINERIGHT, 0, 510},     {H, 0, SB_PAGELEFT, 0, 450},
+        {H, 0, SB_PAGERIGHT, 0, 550},  {H, 0, SB_THUMBTRACK, 200, 200},  {H, 0, SB_THUMBPOSITION, 321, 321},
+        {H, 0, SB_LEFT, 0, 0},         {H, 0, SB_RIGHT, 0, 900},         {H, 0, 100, 25, 475},
+        {H, 0, 101, 25, 525},          {H, 0, 42, 0, 500},
+        {V, 0, SB_LINEUP, 0, 490},     {V, 0, SB_LINEDOWN, 0, 510},      {V, 0, SB_PAGEUP, 0, 450},
+        {V, 0, SB_PAGEDOWN, 0, 550},   {V, 0, SB_THUMBTRACK, 200, 200},  {V, 0, SB_TOP, 0, 0},
+        {V, 0, SB_BOTTOM, 0, 900},     {V, 0, 100, 25, 475},             {V, 0, 101, 25, 525},
+        {V, 0, 42, 0, 500},
+        // Inverted: y grows upwards, so up is towards the maximum.
+        {V, 1, SB_LINEUP, 0, 510},     {V, 1, SB_LINEDOWN, 0, 490},      {V, 1, SB_PAGEUP, 0, 550},
+        {V, 1, SB_PAGEDOWN, 0, 450},   {V, 1, SB_THUMBTRACK, 200, 800},  {V, 1, SB_TOP, 0, 1000},
+        {V, 1, SB_BOTTOM, 0, 100},     {V, 1, 100, 25, 525},             {V, 1, 101, 25, 475},
+        {V, 1, 42, 0, 500},
     };
-    for (const CodeCase& c : cases) {
+    for (const auto& c : cases) {
+        const bool horizontal = c.message == H;
+        SCOPED_TRACE(testing::Message() << (horizontal ? "H" : "V") << " inverted " << c.inverted << " code "
+                                        << c.code);
+        wnd.SetScrollInvertedY(c.inverted);
         SetSquareModel(CPoint(500, 500));
-        SendHScroll(c.code, c.n);
-        EXPECT_EQ(wnd.GetScrollPosition(), CPoint(c.expected, 500)) << "code " << c.code;
-        EXPECT_EQ(BarInfo(HorzBar()).nPos, c.expected) << "code " << c.code;
-        SendHScroll(SB_ENDSCROLL);
+        SendScroll(c.message, c.code, c.n);
+        EXPECT_EQ(wnd.GetScrollPosition(), horizontal ? CPoint(c.expected, 500) : CPoint(500, c.expected));
+        // An inverted bar shows the distance from the top of the range.
+        const int barPosition = !horizontal && c.inverted ? 1000 - c.expected : c.expected;
+        EXPECT_EQ(BarInfo(horizontal ? HorzBar() : VertBar()).nPos, barPosition);
+        SendScroll(c.message, SB_ENDSCROLL);
     }
-}
-
-TEST_F(ScrollWndTest, EveryVerticalCodeMovesToItsTargetInNormalMode)
-{
-    const CodeCase cases[] = {
-        {SB_LINEUP, 0, 490},  {SB_LINEDOWN, 0, 510}, {SB_PAGEUP, 0, 450},   {SB_PAGEDOWN, 0, 550},
-        {SB_THUMBTRACK, 200, 200}, {SB_TOP, 0, 0},   {SB_BOTTOM, 0, 900},   {100, 25, 475},
-        {101, 25, 525},       {42, 0, 500},
-    };
-    for (const CodeCase& c : cases) {
-        SetSquareModel(CPoint(500, 500));
-        SendVScroll(c.code, c.n);
-        EXPECT_EQ(wnd.GetScrollPosition(), CPoint(500, c.expected)) << "code " << c.code;
-        SendVScroll(SB_ENDSCROLL);
-    }
-}
-
-TEST_F(ScrollWndTest, EveryVerticalCodeMovesToItsTargetInInvertedMode)
-{
-    wnd.SetScrollInvertedY(1);
-    const CodeCase cases[] = {
-        {SB_LINEUP, 0, 510},  {SB_LINEDOWN, 0, 490}, {SB_PAGEUP, 0, 550},     {SB_PAGEDOWN, 0, 450},
-        {SB_THUMBTRACK, 200, 800}, {SB_TOP, 0, 1000}, {SB_BOTTOM, 0, 100},    {100, 25, 525},
-        {101, 25, 475},       {42, 0, 500},
-    };
-    for (const CodeCase& c : cases) {
-        SetSquareModel(CPoint(500, 500));
-        SendVScroll(c.code, c.n);
-        EXPECT_EQ(wnd.GetScrollPosition(), CPoint(500, c.expected)) << "code " << c.code;
-        // The bar shows the distance from the top of the range.
-        EXPECT_EQ(BarInfo(VertBar()).nPos, 1000 - c.expected) << "code " << c.code;
-        SendVScroll(SB_ENDSCROLL);
-    }
-}
-
-TEST_F(ScrollWndTest, ThumbOnAScaledBarMapsBackToScrollUnits)
-{
-    wnd.SetScrollRange(0, 2 * 32767, 0, 100);
-    wnd.SetScrollWindowExtent(200, 10);
-    wnd.SetScrollPosition(CPoint(0, 0));
-    SendHScroll(SB_THUMBTRACK, 1234);
-    EXPECT_EQ(wnd.GetScrollPosition().x, 2468);
-}
-
-TEST_F(ScrollWndTest, ThumbMessageFindsItsPositionInABarRangeBeyondSixteenBits)
-{
-    // A bar range of -2 .. 32766 (scale 2.0) and one of 200000 .. 230000:
-    // the message carries the low 16 bits of the thumb position only.
-    wnd.SetScrollRange(-3, 65531, 200000, 230000);
-    wnd.SetScrollWindowExtent(0, 0);
-    wnd.SetScrollPosition(CPoint(1000, 200000));
-    SendHScroll(SB_THUMBTRACK, 0xFFFF & -2);
-    EXPECT_EQ(wnd.GetScrollPosition().x, -4);
-    SendVScroll(SB_THUMBTRACK, 0xFFFF & 210000);
-    EXPECT_EQ(wnd.GetScrollPosition().y, 210000);
 }
 
 TEST_F(ScrollWndTest, DraggingTheRealThumbOfAFarRangeScrolls)
@@ -408,209 +255,99 @@ TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
     wnd.SetScrollRange(0, 10000, 0, 10000);
     wnd.SetScrollWindowExtent(101, 101);
     wnd.SetScrollPosition(CPoint(1000, 5000));
-    wnd.ScrollWindow(Tavo_WiScroll::Up, Tavo_WiScroll::Percent, 50);
+    wnd.ScrollWindow(Up, Tavo_WiScroll::Percent, 50);
     EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5051));
-    wnd.ScrollWindow(Tavo_WiScroll::Right, Tavo_WiScroll::Percent, 50);
+    wnd.ScrollWindow(Right, Tavo_WiScroll::Percent, 50);
     EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1050, 5051));
-    wnd.ScrollWindow(Tavo_WiScroll::Down, Tavo_WiScroll::Percent, 50);
+    wnd.ScrollWindow(Down, Tavo_WiScroll::Percent, 50);
     EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1050, 5000));
-    wnd.ScrollWindow(Tavo_WiScroll::Left, Tavo_WiScroll::Percent, 50);
+    wnd.ScrollWindow(Left, Tavo_WiScroll::Percent, 50);
     EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5000));
-}
-
-TEST_F(ScrollWndTest, PercentStepOfAHugeExtentDoesNotWrap)
-{
-    wnd.SetScrollRange(0, 2000000000, 0, 100);
+    // A negative percentage scrolls nothing.
+    wnd.ScrollWindow(Right, Tavo_WiScroll::Percent, -30);
+    wnd.ScrollWindow(Down, Tavo_WiScroll::Percent, -30);
+    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5000));
+    // The step of a huge extent does not wrap.
+    wnd.SetScrollRange(0, 2000000000, 0, 10000);
     wnd.SetScrollWindowExtent(50000000, 10);
-    wnd.SetScrollPosition(CPoint(0, 0));
-    wnd.ScrollWindow(Tavo_WiScroll::Right, Tavo_WiScroll::Percent, 100);
+    wnd.SetScrollPosition(CPoint(0, 5000));
+    wnd.ScrollWindow(Right, Tavo_WiScroll::Percent, 100);
     EXPECT_EQ(wnd.GetScrollPosition().x, 50000000);
 }
 
-TEST_F(ScrollWndTest, NegativePercentageScrollsNothing)
-{
-    SetSquareModel(CPoint(500, 500));
-    wnd.ScrollWindow(Tavo_WiScroll::Right, Tavo_WiScroll::Percent, -30);
-    wnd.ScrollWindow(Tavo_WiScroll::Down, Tavo_WiScroll::Percent, -30);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(500, 500));
-}
-
-TEST_F(ScrollWndTest, ScrollWindowMapsDirectionAndAmountToTheBarCodes)
-{
-    struct Case
-    {
-        Tavo_WiScroll::Dir dir;
-        Tavo_WiScroll::Amount amount;
-        CPoint expected;
-    };
-    const Case cases[] = {
-        {Tavo_WiScroll::Left, Tavo_WiScroll::Line, {490, 500}},
-        {Tavo_WiScroll::Right, Tavo_WiScroll::Page, {550, 500}},
-        {Tavo_WiScroll::Up, Tavo_WiScroll::Limit, {500, 0}},
-        {Tavo_WiScroll::Down, Tavo_WiScroll::Limit, {500, 900}},
-        {Tavo_WiScroll::Down, Tavo_WiScroll::Line, {500, 510}},
-    };
-    for (const Case& c : cases) {
-        SetSquareModel(CPoint(500, 500));
-        wnd.ScrollWindow(c.dir, c.amount, 77);
-        EXPECT_EQ(wnd.GetScrollPosition(), c.expected) << "dir " << c.dir << " amount " << c.amount;
-    }
-}
-
-TEST_F(ScrollWndTest, ScrollWindowCenterToPutsThePointInTheMiddle)
-{
-    SetSquareModel(CPoint(0, 0));
-    wnd.ScrollWindowCenterTo(CPoint(500, 500));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(450, 450));
-
-    wnd.SetScrollInvertedY(1);
-    wnd.ScrollWindowCenterTo(CPoint(500, 500));
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(450, 550));
-}
-
-// ---- ScrollWindowTest ---------------------------------------------------------------------
-
-TEST_F(ScrollWndTest, LimitTowardsTheEdgeAlreadyReachedMovesNothingButStillEnds)
-{
-    SetSquareModel(CPoint(0, 500));
-    wnd.ScrollWindow(Tavo_WiScroll::Left, Tavo_WiScroll::Limit, 0);
-    EXPECT_TRUE(wnd.CallsNamed("ScrollDeltas").empty()) << "no ScrollWindowTo";
-    ASSERT_EQ(wnd.calls.size(), 1u);
-    EXPECT_EQ(wnd.calls[0], (Call{"NonDragScrollEnd", 0, 0, {0, 500}, -1}));
-    EXPECT_FALSE(wnd.ScrollWindowTest(Tavo_WiScroll::Left, Tavo_WiScroll::Limit, 0));
-}
+// ---- ScrollWindowTest and drag scrolling -------------------------------------------------
 
 TEST_F(ScrollWndTest, ScrollWindowTestChangesNeitherPositionNorBarsNorPixels)
 {
     SetSquareModel(CPoint(900, 500));
     ::UpdateWindow(Scrollee());
-    const SCROLLINFO before = BarInfo(HorzBar());
-
-    // At the right end a line to the right is clamped back: false.
-    EXPECT_FALSE(wnd.ScrollWindowTest(Tavo_WiScroll::Right, Tavo_WiScroll::Line, 0));
-    // A line to the left would move: true, yet nothing moves.
-    EXPECT_TRUE(wnd.ScrollWindowTest(Tavo_WiScroll::Left, Tavo_WiScroll::Line, 0));
-    EXPECT_TRUE(wnd.ScrollWindowTest(Tavo_WiScroll::Up, Tavo_WiScroll::Percent, 10));
-
+    const int barPosition = BarInfo(HorzBar()).nPos;
+    EXPECT_FALSE(wnd.ScrollWindowTest(Right, Tavo_WiScroll::Line, 0)) << "clamped back at the right end";
+    EXPECT_TRUE(wnd.ScrollWindowTest(Left, Tavo_WiScroll::Line, 0));
+    EXPECT_TRUE(wnd.ScrollWindowTest(Up, Tavo_WiScroll::Percent, 10));
     EXPECT_EQ(wnd.GetScrollPosition(), CPoint(900, 500));
-    EXPECT_EQ(BarInfo(HorzBar()).nPos, before.nPos);
-    EXPECT_TRUE(wnd.CallsNamed("ScrollDeltas").empty()) << "no pixels were scrolled";
+    EXPECT_EQ(BarInfo(HorzBar()).nPos, barPosition);
     EXPECT_FALSE(::GetUpdateRect(Scrollee(), nullptr, FALSE)) << "nothing was invalidated";
-    // Each test ends like a ScrollWindow call, with the unchanged position.
-    EXPECT_EQ(wnd.CallsNamed("NonDragScrollEnd").size(), 3u);
-    EXPECT_EQ(wnd.CallsNamed("NonDragScrollEnd").back().point, CPoint(900, 500));
+    // Each test ends like a ScrollWindow call, with the unchanged position,
+    // and moves no pixels.
+    const Call end{"NonDragScrollEnd", 0, 0, {900, 500}, -1};
+    EXPECT_EQ(wnd.calls, (std::vector<Call>{end, end, end}));
+
+    // A limit towards the edge already reached moves nothing but still ends.
+    SetSquareModel(CPoint(0, 500));
+    wnd.ScrollWindow(Left, Tavo_WiScroll::Limit, 0);
+    EXPECT_EQ(wnd.calls, (std::vector<Call>{{"NonDragScrollEnd", 0, 0, {0, 500}, -1}}));
 }
 
-// ---- drag scrolling ---------------------------------------------------------------------
-
-TEST_F(ScrollWndTest, ThumbStartsADragScrollAndTheEndCodeEndsIt)
+TEST_F(ScrollWndTest, ThumbCodesDragScrollAndTheEndCodeEndsWhicheverScrollRan)
 {
     SetSquareModel(CPoint(500, 500));
-    SendHScroll(SB_THUMBTRACK, 300);
-    SendHScroll(SB_THUMBTRACK, 310);
-    SendHScroll(SB_THUMBPOSITION, 310);
+    SendScroll(WM_HSCROLL, SB_THUMBTRACK, 300);
+    SendScroll(WM_HSCROLL, SB_THUMBTRACK, 310);
+    SendScroll(WM_HSCROLL, SB_THUMBPOSITION, 310);
     EXPECT_EQ(wnd.IsDragScrolling(), 1);
-    SendHScroll(SB_ENDSCROLL);
+    SendScroll(WM_HSCROLL, SB_ENDSCROLL);
     EXPECT_EQ(wnd.IsDragScrolling(), 0);
+    SendScroll(WM_VSCROLL, SB_LINEDOWN);
+    SendScroll(WM_VSCROLL, SB_ENDSCROLL);
 
     const std::vector<Call> expected = {
         {"DragScrollStart", 0, 0, {500, 500}, -1}, {"ScrollDeltas", 0, 0, {300, 500}, -1},
         {"DragScrollMove", 0, 0, {300, 500}, -1},  {"ScrollDeltas", 0, 0, {310, 500}, -1},
         {"DragScrollMove", 0, 0, {310, 500}, -1},  {"DragScrollEnd", 0, 0, {310, 500}, -1},
+        {"ScrollDeltas", 0, 0, {310, 510}, -1},    {"NonDragScrollEnd", 0, 0, {310, 510}, -1},
     };
     EXPECT_EQ(wnd.calls, expected);
 }
 
-TEST_F(ScrollWndTest, EndCodeWithoutThumbEndsANonDragScroll)
-{
-    SetSquareModel(CPoint(500, 500));
-    SendVScroll(SB_LINEDOWN);
-    SendVScroll(SB_ENDSCROLL);
-    const std::vector<Call> expected = {
-        {"ScrollDeltas", 0, 0, {500, 510}, -1},
-        {"NonDragScrollEnd", 0, 0, {500, 510}, -1},
-    };
-    EXPECT_EQ(wnd.calls, expected);
-}
+// ---- layout and pixels ----------------------------------------------------------------------
 
-TEST_F(ScrollWndTest, ScrollWindowDuringADerivedDragMovesWithoutEnding)
+TEST_F(ScrollWndTest, BarAppearsOnlyWhenTheRangeIsWiderThanTheWindowAndTheChildrenTileIt)
 {
-    SetSquareModel(CPoint(500, 500));
-    wnd.SetDragScrollingFlag(1);
-    wnd.ScrollWindow(Tavo_WiScroll::Right, Tavo_WiScroll::Line, 0);
-    const std::vector<Call> expected = {
-        {"ScrollDeltas", 0, 0, {510, 500}, -1},
-        {"DragScrollMove", 0, 0, {510, 500}, -1},
-    };
-    EXPECT_EQ(wnd.calls, expected);
-    EXPECT_EQ(wnd.IsDragScrolling(), 1);
-}
-
-// ---- layout ----------------------------------------------------------------------------------
-
-TEST_F(ScrollWndTest, LayoutPlacesScrolleeBarsAndCorner)
-{
-    SetSquareModel(CPoint(0, 0));   // 1000 units do not fit: both bars
     const int vw = ::GetSystemMetrics(SM_CXVSCROLL);
     const int hh = ::GetSystemMetrics(SM_CYHSCROLL);
-    const int cw = WndWidth - vw;
+    wnd.SetScrollRange(0, WndWidth, 0, WndHeight + 1);
+    wnd.SetScrollDone();
+    EXPECT_FALSE(::IsWindowVisible(HorzBar())) << "exactly as wide as the range";
+    EXPECT_TRUE(::IsWindowVisible(VertBar()));
+    EXPECT_FALSE(::IsWindowVisible(Corner()));
+    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth - vw, WndHeight));
+    EXPECT_EQ(ChildRect(VertBar()), CRect(WndWidth - vw, 0, WndWidth, WndHeight));
+
+    // One pixel narrower, through a real WM_SIZE.
+    const int width = WndWidth - 1;
+    ::SetWindowPos(wnd.GetSafeHwnd(), nullptr, 0, 0, width, WndHeight, SWP_NOZORDER | SWP_NOMOVE);
+    for (HWND child : {HorzBar(), VertBar(), Corner()})
+        EXPECT_TRUE(::IsWindowVisible(child));
+    const int cw = width - vw;
     const int ch = WndHeight - hh;
     EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, cw, ch));
     EXPECT_EQ(ChildRect(HorzBar()), CRect(0, ch, cw, WndHeight));
-    EXPECT_EQ(ChildRect(VertBar()), CRect(cw, 0, WndWidth, ch));
-    EXPECT_EQ(ChildRect(Corner()), CRect(cw, ch, WndWidth, WndHeight));
-    EXPECT_TRUE(::IsWindowVisible(HorzBar()));
-    EXPECT_TRUE(::IsWindowVisible(VertBar()));
-    EXPECT_TRUE(::IsWindowVisible(Corner()));
+    EXPECT_EQ(ChildRect(VertBar()), CRect(cw, 0, width, ch));
+    EXPECT_EQ(ChildRect(Corner()), CRect(cw, ch, width, WndHeight));
 }
 
-TEST_F(ScrollWndTest, BarIsHiddenWhenTheClientIsExactlyAsWideAsTheRange)
-{
-    wnd.SetScrollRange(0, WndWidth, 0, WndHeight + 1);
-    wnd.SetScrollDone();
-    EXPECT_FALSE(::IsWindowVisible(HorzBar()));
-    EXPECT_TRUE(::IsWindowVisible(VertBar()));
-    EXPECT_FALSE(::IsWindowVisible(Corner()));
-    const int vw = ::GetSystemMetrics(SM_CXVSCROLL);
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth - vw, WndHeight));
-
-    // One pixel narrower, through a real WM_SIZE.
-    ::SetWindowPos(wnd.GetSafeHwnd(), nullptr, 0, 0, WndWidth - 1, WndHeight, SWP_NOZORDER | SWP_NOMOVE);
-    EXPECT_TRUE(::IsWindowVisible(HorzBar()));
-    EXPECT_TRUE(::IsWindowVisible(Corner()));
-}
-
-TEST_F(ScrollWndTest, UnchangedVisibilityFlagsDoNotLayOutAgain)
-{
-    // The size message at creation decided (0, 0) for the default range,
-    // before any child existed.
-    wnd.SetScrollBarAutoVisibilityFlag(0);
-    wnd.SetScrollBarVisibilityFlags(0, 0);
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, 10, 10));
-    wnd.SetScrollBarVisibilityFlags(1, 1);
-    wnd.SetScrollBarVisibilityFlags(0, 0);
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth, WndHeight));
-    ::SetWindowPos(Scrollee(), nullptr, 0, 0, 50, 50, SWP_NOZORDER);
-    wnd.SetScrollBarVisibilityFlags(0, 0);
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, 50, 50));
-    wnd.SetScrollBarVisibilityFlags(1, 0);
-    EXPECT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth, WndHeight - ::GetSystemMetrics(SM_CYHSCROLL)));
-}
-
-TEST_F(ScrollWndTest, AutoVisibilityOverridesTheFlagsAtTheNextSetScrollDone)
-{
-    wnd.SetScrollRange(0, 10, 0, 10);
-    wnd.SetScrollBarVisibilityFlags(1, 1);
-    EXPECT_TRUE(::IsWindowVisible(HorzBar()));
-    wnd.SetScrollDone();
-    EXPECT_FALSE(::IsWindowVisible(HorzBar()));
-    EXPECT_FALSE(::IsWindowVisible(VertBar()));
-}
-
-// ---- pixels -----------------------------------------------------------------------------------
-
-// Paints vertical stripes 8 units wide whose colour depends on the scroll
-// unit under each pixel column, so that the content shows the position.
+// Vertical stripes 8 units wide whose colour shows the scroll unit under each column.
 COLORREF StripeColour(int unit)
 {
     return ((unit / 8) % 2) != 0 ? RGB(255, 0, 0) : RGB(0, 0, 255);
@@ -625,53 +362,75 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
     wnd.SetScrollPosition(CPoint(0, 0));
     wnd.SetScrollDone();
     wnd.painter = [this](Tavo_WiScrollee*, CDC* dc) {
-        const int first = wnd.GetScrollPosition().x;
         for (int x = 0; x < WndWidth; ++x)
-            dc->FillSolidRect(x, 0, 1, WndHeight, StripeColour(first + x));
+            dc->FillSolidRect(x, 0, 1, WndHeight, StripeColour(wnd.GetScrollPosition().x + x));
     };
     ::InvalidateRect(Scrollee(), nullptr, TRUE);
     ::UpdateWindow(Scrollee());
-    {
-        Pixels before(Scrollee(), WndWidth, WndHeight);
-        ASSERT_EQ(before.At(0, 10), StripeColour(0));
-        ASSERT_EQ(before.At(8, 10), StripeColour(8));
+    ASSERT_EQ(PixelAt(Scrollee(), 0, 0), StripeColour(0));
+    ASSERT_EQ(PixelAt(Scrollee(), 8, 0), StripeColour(8));
+    wnd.painter = nullptr;
+
+    // 13 units right moves the content 13 pixels left, then 5 units back 5 pixels right.
+    const struct { int x; CRect strip; int firstKept, lastKept; } steps[] = {
+        {13, {WndWidth - 13, 0, WndWidth, WndHeight}, 0, WndWidth - 13}, {8, {0, 0, 5, WndHeight}, 5, WndWidth - 13}};
+    for (const auto& step : steps) {
+        SCOPED_TRACE(step.x);
+        ::ValidateRect(Scrollee(), nullptr);
+        wnd.ScrollWindowTo(CPoint(step.x, 0));
+        CRect update;
+        ASSERT_TRUE(::GetUpdateRect(Scrollee(), &update, FALSE));
+        EXPECT_EQ(update, step.strip);
+        for (int x = step.firstKept; x < step.lastKept; ++x)
+            ASSERT_EQ(PixelAt(Scrollee(), x, 150), StripeColour(x + step.x)) << "column " << x;
     }
 
-    // Scrolling 13 units right moves the content 13 pixels left.
-    wnd.painter = nullptr;
-    wnd.ScrollWindowTo(CPoint(13, 0));
-    CRect update;
-    ASSERT_TRUE(::GetUpdateRect(Scrollee(), &update, FALSE));
-    EXPECT_EQ(update, CRect(WndWidth - 13, 0, WndWidth, WndHeight));
-    Pixels moved(Scrollee(), WndWidth, WndHeight);
-    for (int x = 0; x < WndWidth - 13; ++x)
-        ASSERT_EQ(moved.At(x, 150), StripeColour(x + 13)) << "column " << x;
-
-    // Scrolling back 5 units moves the content 5 pixels right.
-    ::ValidateRect(Scrollee(), nullptr);
-    wnd.ScrollWindowTo(CPoint(8, 0));
-    ASSERT_TRUE(::GetUpdateRect(Scrollee(), &update, FALSE));
-    EXPECT_EQ(update, CRect(0, 0, 5, WndHeight));
-    Pixels back(Scrollee(), WndWidth, WndHeight);
-    for (int x = 5; x < WndWidth - 13; ++x)
-        ASSERT_EQ(back.At(x, 150), StripeColour(x + 8)) << "column " << x;
-}
-
-TEST_F(ScrollWndTest, InvertedModeScrollsUpwardsContentDown)
-{
+    // Inverted: moving the top edge up by 20 units shows more above, so the content moves down.
     wnd.SetScrollInvertedY(1);
-    wnd.SetScrollBarAutoVisibilityFlag(0);
-    wnd.SetScrollBarVisibilityFlags(0, 0);
     wnd.SetScrollRange(0, WndWidth, 0, 4000);
-    wnd.SetScrollWindowExtent(WndWidth, WndHeight);
     wnd.SetScrollPosition(CPoint(0, 2000));
     wnd.SetScrollDone();
     ::ValidateRect(Scrollee(), nullptr);
-    // Moving the top edge up by 20 units shows more above: the content moves down.
     wnd.ScrollWindowTo(CPoint(0, 2020));
     CRect update;
     ASSERT_TRUE(::GetUpdateRect(Scrollee(), &update, FALSE));
     EXPECT_EQ(update, CRect(0, 0, WndWidth, 20));
+}
+
+// ---- destruction ------------------------------------------------------------------------------
+
+TEST_F(ScrollWndTest, DestructionTakesEveryWindowOfTheFamilyWithIt)
+{
+    for (const bool byDestructorAlone : {false, true}) {
+        SCOPED_TRACE(byDestructorAlone ? "destructor" : "DestroyWindow");
+        std::vector<HWND> windows;
+        {
+            RecordingScrollWnd other;
+            ASSERT_TRUE(other.Create(WS_CHILD | WS_VISIBLE, CRect(0, 0, 100, 100), host.Wnd(), 78));
+            const HWND scrollee = other.GetScrollee()->GetSafeHwnd();
+            windows = {other.GetSafeHwnd(), scrollee,
+                       ::GetDlgItem(scrollee, Tavo_WiParkedCursorMonitor::ControlId),
+                       other.GetScrollee()->GetDataTip()->GetSafeHwnd()};
+            for (UINT id : {Tavo_WiScrollWnd::HorzBarId, Tavo_WiScrollWnd::VertBarId, Tavo_WiScrollWnd::CornerId})
+                windows.push_back(::GetDlgItem(other.GetSafeHwnd(), id));
+            for (HWND hwnd : windows)
+                ASSERT_TRUE(::IsWindow(hwnd));
+            if (!byDestructorAlone) {
+                EXPECT_TRUE(other.DestroyWindow());
+                EXPECT_EQ(other.GetSafeHwnd(), nullptr);
+                EXPECT_FALSE(other.DestroyWindow()) << "a second DestroyWindow finds no window";
+            }
+        }
+        for (HWND hwnd : windows)
+            EXPECT_FALSE(::IsWindow(hwnd));
+    }
+
+    // The scrollee alone takes its monitor and its data tip, an owned popup, with it.
+    const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
+    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
+    EXPECT_TRUE(wnd.GetScrollee()->DestroyWindow());
+    EXPECT_FALSE(::IsWindow(monitor));
+    EXPECT_FALSE(::IsWindow(tip));
 }
 
 }  // namespace
