@@ -130,8 +130,8 @@ std::vector<TestWindow::Note>& TestWindow::Notes()
 
 std::ostream& operator<<(std::ostream& out, const Call& call)
 {
-    return out << call.name << "(button " << call.button << ", flags " << call.flags << ", ("
-               << call.point.x << ", " << call.point.y << "), completed " << call.completed << ")";
+    return out << call.name << "(button " << call.button << ", flags " << call.flags << ", (" << call.point.x
+               << ", " << call.point.y << "), completed " << call.completed << ")";
 }
 
 std::vector<Call> RecordingScrollWnd::CallsNamed(const std::string& name) const
