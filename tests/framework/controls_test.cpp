@@ -14,6 +14,7 @@ constexpr UINT kBarId = 1001;
 constexpr UINT kButtonId = 1003;
 
 struct ScrollEvent {
+  UINT message;
   UINT code;
   UINT position;
   CScrollBar* bar;
@@ -21,17 +22,16 @@ struct ScrollEvent {
 
 class CScrollParentWnd : public CWnd {
 public:
-  std::vector<ScrollEvent> m_horizontal;
-  std::vector<ScrollEvent> m_vertical;
+  std::vector<ScrollEvent> m_events;
 
 protected:
   afx_msg void OnHScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar)
   {
-    m_horizontal.push_back({nSBCode, nPos, pScrollBar});
+    m_events.push_back({WM_HSCROLL, nSBCode, nPos, pScrollBar});
   }
   afx_msg void OnVScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar)
   {
-    m_vertical.push_back({nSBCode, nPos, pScrollBar});
+    m_events.push_back({WM_VSCROLL, nSBCode, nPos, pScrollBar});
   }
   DECLARE_MESSAGE_MAP()
 };
@@ -52,43 +52,39 @@ protected:
 
 }  // namespace
 
-TEST_F(ControlsTest, ScrollBarIsARealControlWhoseStateRoundTrips)
+TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
 {
-  CScrollBar bar;
-  ASSERT_TRUE(bar.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 10, 100), &m_parent, kBarId));
+  CScrollBar vertical;
+  ASSERT_TRUE(vertical.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 0, 10, 100), &m_parent, kBarId));
   char className[32] = {};
-  ::GetClassNameA(bar.m_hWnd, className, sizeof(className));
+  ::GetClassNameA(vertical.m_hWnd, className, sizeof(className));
   EXPECT_EQ(0, ::lstrcmpiA("ScrollBar", className));
-  EXPECT_EQ(&bar, CWnd::FromHandlePermanent(bar.m_hWnd));
-  EXPECT_EQ(static_cast<int>(kBarId), bar.GetDlgCtrlID());
-  bar.SetScrollRange(0, 32767);
+  EXPECT_EQ(&vertical, CWnd::FromHandlePermanent(vertical.m_hWnd));
+  EXPECT_EQ(static_cast<int>(kBarId), vertical.GetDlgCtrlID());
+  vertical.SetScrollRange(0, 32767);
   SCROLLINFO page = {};
   page.fMask = SIF_PAGE;
   page.nPage = 100;
-  EXPECT_TRUE(bar.SetScrollInfo(&page));
-  EXPECT_EQ(32767 - 99, bar.GetScrollLimit());  // the last position that still shows a full page
-  bar.SetScrollPos(500);
-  EXPECT_EQ(500, bar.GetScrollPos());
-}
-
-TEST_F(ControlsTest, ScrollMessagesReachParentWithBarObjectAndThumbPosition)
-{
-  CScrollBar horizontal;
-  ASSERT_TRUE(horizontal.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(0, 0, 100, 16), &m_parent, kBarId));
-  horizontal.SetScrollRange(0, 100);
-  horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);  // the control itself reports to its parent
-  ASSERT_FALSE(m_parent.m_horizontal.empty());
-  EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_horizontal.front().code);
-  EXPECT_EQ(&horizontal, m_parent.m_horizontal.front().bar);
-  EXPECT_TRUE(m_parent.m_vertical.empty());
-
-  CScrollBar vertical;
-  ASSERT_TRUE(vertical.Create(WS_CHILD | WS_VISIBLE | SBS_VERT, CRect(0, 20, 16, 120), &m_parent, kBarId + 1));
+  EXPECT_TRUE(vertical.SetScrollInfo(&page));
+  EXPECT_EQ(32767 - 99, vertical.GetScrollLimit());  // the last position that still shows a full page
+  vertical.SetScrollPos(500);
+  EXPECT_EQ(500, vertical.GetScrollPos());
   m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(vertical.m_hWnd));
-  ASSERT_EQ(1u, m_parent.m_vertical.size());
-  EXPECT_EQ(static_cast<UINT>(SB_THUMBTRACK), m_parent.m_vertical[0].code);
-  EXPECT_EQ(4242u, m_parent.m_vertical[0].position);
-  EXPECT_EQ(&vertical, m_parent.m_vertical[0].bar);
+  ASSERT_EQ(1u, m_parent.m_events.size());
+  EXPECT_EQ(static_cast<UINT>(WM_VSCROLL), m_parent.m_events[0].message);
+  EXPECT_EQ(static_cast<UINT>(SB_THUMBTRACK), m_parent.m_events[0].code);
+  EXPECT_EQ(4242u, m_parent.m_events[0].position);
+  EXPECT_EQ(&vertical, m_parent.m_events[0].bar);
+
+  CScrollBar horizontal;
+  ASSERT_TRUE(horizontal.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(20, 0, 120, 16), &m_parent, kBarId + 1));
+  horizontal.SetScrollRange(0, 100);
+  m_parent.m_events.clear();
+  horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);  // the control itself reports to its parent
+  ASSERT_FALSE(m_parent.m_events.empty());
+  EXPECT_EQ(static_cast<UINT>(WM_HSCROLL), m_parent.m_events.front().message);
+  EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_events.front().code);
+  EXPECT_EQ(&horizontal, m_parent.m_events.front().bar);
 }
 
 TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)

@@ -1,11 +1,10 @@
-// extension_test.cpp - a class exported by an extension library, deriving
-// from CWnd across the module boundary, and resources found through the
-// extension-module chain.
+// extension_test.cpp - resources found through the extension-module chain,
+// and links leaving the chain.
 #include <afxwin.h>
 
 #include <gtest/gtest.h>
 
-#include "ExtensionWnd.h"
+#include "extension_library.h"
 #include "extension_resources.h"
 #include "framework_test_support.h"
 
@@ -16,21 +15,6 @@ HMODULE ExtensionModule() { return ::GetModuleHandleA("afx_test_extension.dll");
 using ExtensionTest = framework_test::WindowTest;
 
 }  // namespace
-
-TEST_F(ExtensionTest, ExportedWindowClassGetsItsMessagesAndCWndsDefaults)
-{
-  CWnd parent;
-  ASSERT_TRUE(parent.CreateEx(0, NULL, "parent", WS_POPUP, 0, 0, 100, 100, NULL, NULL));
-  CExtensionWnd wnd;
-  ASSERT_TRUE(wnd.CreateChild(&parent, 5));
-  EXPECT_EQ(1, wnd.m_createCount);
-  EXPECT_EQ(0x5A5A, wnd.SendMessage(CExtensionWnd::GetPingMessage(), 0, 99));
-  EXPECT_EQ(99, wnd.m_lastPing);
-  const HWND hWnd = wnd.m_hWnd;
-  EXPECT_TRUE(wnd.DestroyWindow());  // CWnd's own map entry detaches it
-  EXPECT_EQ(nullptr, wnd.m_hWnd);
-  EXPECT_EQ(nullptr, CWnd::FromHandlePermanent(hWnd));
-}
 
 TEST_F(ExtensionTest, StringIsFoundInTheLibraryThatJoinedTheChainAtLoad)
 {
@@ -52,15 +36,6 @@ TEST_F(ExtensionTest, CursorIsFoundInTheExtensionLibrary)
   CWinApp app;
   EXPECT_NE(nullptr, app.LoadCursor(IDC_EXTENSION_CURSOR));
   EXPECT_EQ(AfxGetResourceHandle(), AfxFindResourceHandle(MAKEINTRESOURCEA(31999), RT_GROUP_CURSOR));
-}
-
-TEST_F(ExtensionTest, ResourceHandleIsSearchedFirst)
-{
-  AfxSetResourceHandle(ExtensionModule());
-  EXPECT_EQ(ExtensionModule(), AfxGetResourceHandle());
-  EXPECT_EQ(ExtensionModule(), AfxFindStringResourceHandle(IDS_EXTENSION_GREETING));
-  AfxSetResourceHandle(NULL);
-  EXPECT_EQ(AfxGetInstanceHandle(), AfxGetResourceHandle());
 }
 
 TEST_F(ExtensionTest, RemovedLinkIsNoLongerSearched)

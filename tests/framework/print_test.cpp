@@ -9,14 +9,13 @@
 
 namespace {
 
-// Ids of the standard print dialog template's controls.
-constexpr int kAllPagesButton = 1056;    // rad1
-constexpr int kSelectionButton = 1057;   // rad2
-constexpr int kPageRangeButton = 1058;   // rad3
-constexpr UINT kCloseRequest = WM_APP + 40;
+// Ids of the standard print dialog template's radio buttons.
+constexpr int kAllPagesButton = 1056;   // rad1
+constexpr int kSelectionButton = 1057;  // rad2
+constexpr int kPageRangeButton = 1058;  // rad3
 
-// A print dialog that looks at its real controls when it opens, then asks
-// its own message map to close it.
+// A print dialog that looks at its real controls when it opens, then closes
+// itself from there.
 class CInspectingPrintDialog : public CPrintDialog {
 public:
   explicit CInspectingPrintDialog(UINT closeCommand)
@@ -32,37 +31,18 @@ public:
   {
     const BOOL result = CPrintDialog::OnInitDialog();
     ++m_initCount;
-    m_attachedToDialog = ::IsWindow(m_hWnd) && CWnd::FromHandlePermanent(m_hWnd) == this;
+    // Attached and subclassed, so the dialog's messages reach this object.
+    m_attachedToDialog = CWnd::FromHandlePermanent(m_hWnd) == this &&
+                         ::GetWindowLongPtrA(m_hWnd, GWLP_WNDPROC) == reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc());
     CheckRadioButton(kAllPagesButton, kPageRangeButton, kSelectionButton);
     m_selectionChecked = IsDlgButtonChecked(kSelectionButton);
-    PostMessage(kCloseRequest);
+    PostMessage(WM_COMMAND, MAKEWPARAM(m_closeCommand, BN_CLICKED), 0);
     return result;
   }
 
-protected:
-  afx_msg LRESULT OnCloseRequest(WPARAM, LPARAM)
-  {
-    PostMessage(WM_COMMAND, MAKEWPARAM(m_closeCommand, BN_CLICKED), 0);
-    return 0;
-  }
-  DECLARE_MESSAGE_MAP()
-
 private:
-  UINT m_closeCommand;
+  const UINT m_closeCommand;
 };
-
-BEGIN_MESSAGE_MAP(CInspectingPrintDialog, CPrintDialog)
-  ON_MESSAGE(kCloseRequest, &CInspectingPrintDialog::OnCloseRequest)
-END_MESSAGE_MAP()
-
-void FreePrinterHandles(PRINTDLG& pd)
-{
-  if (pd.hDC != NULL) ::DeleteDC(pd.hDC);
-  if (pd.hDevMode != NULL) ::GlobalFree(pd.hDevMode);
-  if (pd.hDevNames != NULL) ::GlobalFree(pd.hDevNames);
-  pd.hDC = NULL;
-  pd.hDevMode = pd.hDevNames = NULL;
-}
 
 class PrintTest : public framework_test::WindowTest {
 protected:
@@ -95,7 +75,10 @@ TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
       EXPECT_TRUE(dialog.PrintSelection());  // the selection button was checked in OnInitDialog
       EXPECT_FALSE(dialog.GetDeviceName().IsEmpty());
     }
-    FreePrinterHandles(dialog.m_pd);
+    // The printer handles belong to the caller.
+    ::DeleteDC(dialog.m_pd.hDC);
+    ::GlobalFree(dialog.m_pd.hDevMode);
+    ::GlobalFree(dialog.m_pd.hDevNames);
   }
 }
 
@@ -110,8 +93,6 @@ TEST_F(PrintTest, PrintInfoStartsWithFrameworkDialogFlagsAndFullPageRange)
   EXPECT_EQ(0xFFFFu, info.GetMaxPage());
   EXPECT_EQ(1u, info.GetFromPage());
   EXPECT_EQ(0xFFFFu, info.GetToPage());
-  info.SetMaxPage(30);
-  EXPECT_EQ(30u, info.m_pPD->m_pd.nMaxPage);
 }
 
 TEST_F(PrintTest, PrintInfoOwnsTheDialogPutInIt)
@@ -130,28 +111,23 @@ TEST_F(PrintTest, PrintInfoOwnsTheDialogPutInIt)
   EXPECT_EQ(1, destroyed);
 }
 
-TEST_F(PrintTest, ApplicationPrinterDefaultsAreTakenOnceAndKept)
-{
-  CWinApp app;
-  PRINTDLG first = {};
-  ASSERT_TRUE(app.GetPrinterDeviceDefaults(&first));
-  EXPECT_NE(nullptr, first.hDevNames);
-  EXPECT_NE(nullptr, first.hDevMode);
-  PRINTDLG second = {};
-  ASSERT_TRUE(app.GetPrinterDeviceDefaults(&second));
-  EXPECT_EQ(first.hDevNames, second.hDevNames);
-  EXPECT_EQ(first.hDevMode, second.hDevMode);
-  EXPECT_EQ(app.m_hDevNames, first.hDevNames);
-}
-
-TEST_F(PrintTest, PrinterDcFromDefaultsGivesCapabilitiesAsAttributeHandle)
+TEST_F(PrintTest, ApplicationKeepsOnePrinterDefaultAndPrinterDcsComeFromIt)
 {
   CWinApp app;
   CPrintInfo info;
-  ASSERT_TRUE(app.GetPrinterDeviceDefaults(&info.m_pPD->m_pd));
+  PRINTDLG& pd = info.m_pPD->m_pd;
+  EXPECT_EQ(nullptr, info.m_pPD->CreatePrinterDC());  // no printer data yet
+  ASSERT_TRUE(app.GetPrinterDeviceDefaults(&pd));
+  EXPECT_NE(nullptr, pd.hDevMode);
+  PRINTDLG again = {};
+  ASSERT_TRUE(app.GetPrinterDeviceDefaults(&again));  // lent again, not taken anew
+  EXPECT_EQ(app.m_hDevNames, pd.hDevNames);
+  EXPECT_EQ(pd.hDevNames, again.hDevNames);
+  EXPECT_EQ(pd.hDevMode, again.hDevMode);
+
   const HDC printer = info.m_pPD->CreatePrinterDC();
   ASSERT_NE(nullptr, printer);
-  EXPECT_EQ(printer, info.m_pPD->m_pd.hDC);
+  EXPECT_EQ(printer, pd.hDC);
   // Drawing on the screen with the printer's measures, as a preview does.
   CDC dc;
   ASSERT_TRUE(dc.CreateCompatibleDC(NULL));
@@ -161,16 +137,7 @@ TEST_F(PrintTest, PrinterDcFromDefaultsGivesCapabilitiesAsAttributeHandle)
   EXPECT_NE(::GetDeviceCaps(dc.m_hDC, HORZRES), dc.GetDeviceCaps(HORZRES));
   dc.ReleaseAttribDC();
   ::DeleteDC(printer);
-  info.m_pPD->m_pd.hDC = NULL;
-  info.m_pPD->m_pd.hDevMode = info.m_pPD->m_pd.hDevNames = NULL;  // the application's
-}
-
-TEST_F(PrintTest, ApplicationCreatesPrinterDcButDialogWithoutPrinterDataGivesNull)
-{
-  CWinApp app;
-  CDC dc;
-  ASSERT_TRUE(app.CreatePrinterDC(dc));
-  EXPECT_EQ(DT_RASPRINTER, dc.GetDeviceCaps(TECHNOLOGY));
-  CPrintDialog dialog(FALSE);
-  EXPECT_EQ(nullptr, dialog.CreatePrinterDC());
+  CDC appPrinter;
+  ASSERT_TRUE(app.CreatePrinterDC(appPrinter));
+  EXPECT_EQ(DT_RASPRINTER, appPrinter.GetDeviceCaps(TECHNOLOGY));
 }

@@ -15,9 +15,7 @@ constexpr UINT kProbeMessage = WM_APP + 20;
 
 class CRecordingWnd : public CWnd {
 public:
-  CRecordingWnd(std::vector<CWnd*>& order, BOOL takesMessage = FALSE) : m_order(order), m_takesMessage(takesMessage)
-  {
-  }
+  explicit CRecordingWnd(std::vector<CWnd*>& order) : m_order(order) {}
   BOOL PreTranslateMessage(MSG* pMsg) override
   {
     if (pMsg->message != kProbeMessage) return FALSE;
@@ -29,22 +27,21 @@ public:
     if (message == kProbeMessage) ++m_dispatched;
     return CWnd::WindowProc(message, wParam, lParam);
   }
+  BOOL m_takesMessage = FALSE;
   int m_dispatched = 0;
 
 private:
   std::vector<CWnd*>& m_order;
-  BOOL m_takesMessage;
 };
 
 class PumpTest : public framework_test::WindowTest {
 protected:
   void SetUp() override
   {
-    framework_test::DispatchPendingMessages();
     ASSERT_TRUE(m_top.CreateEx(0, NULL, "top", WS_OVERLAPPEDWINDOW, 0, 0, 200, 200, NULL, NULL));
     ASSERT_TRUE(m_middle.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 100, 100), &m_top, 1));
     ASSERT_TRUE(m_leaf.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 50, 50), &m_middle, 2));
-    framework_test::DispatchPendingMessages();
+    framework_test::DispatchPendingMessages();  // the probe is the next message
   }
 
   std::vector<CWnd*> m_order;
@@ -71,17 +68,12 @@ TEST_F(PumpTest, PreTranslateSeesTargetThenEachParentWithOrWithoutApplication)
 
 TEST_F(PumpTest, WindowThatTakesMessageEndsWalkAndDispatch)
 {
-  std::vector<CWnd*> order;
-  CRecordingWnd taker(order, TRUE);
-  ASSERT_TRUE(taker.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 40, 40), &m_middle, 3));
-  CRecordingWnd leaf(order);
-  ASSERT_TRUE(leaf.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 20, 20), &taker, 4));
+  m_middle.m_takesMessage = TRUE;
   CWinApp app;
-  ASSERT_TRUE(leaf.PostMessage(kProbeMessage));
+  ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
   ASSERT_TRUE(app.PumpMessage());
-  EXPECT_EQ((std::vector<CWnd*>{&leaf, &taker}), order);
-  EXPECT_TRUE(m_order.empty());  // middle and top never saw it
-  EXPECT_EQ(0, leaf.m_dispatched);
+  EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle}), m_order);
+  EXPECT_EQ(0, m_leaf.m_dispatched);
 }
 
 TEST_F(PumpTest, WalkStopsAtTheStopWindow)
