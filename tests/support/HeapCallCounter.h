@@ -16,7 +16,6 @@ public:
     explicit HeapCallCounter(const std::vector<HMODULE>& modules);
     // One loaded module by name, for example "libTavo_Core.dll".
     explicit HeapCallCounter(const char* moduleName);
-    ~HeapCallCounter();
     HeapCallCounter(const HeapCallCounter&) = delete;
     HeapCallCounter& operator=(const HeapCallCounter&) = delete;
 

@@ -40,17 +40,12 @@ ImportPatch::ImportPatch(HMODULE module, const char* function, void* replacement
         const IMAGE_THUNK_DATA* name = descriptor->OriginalFirstThunk
             ? At<IMAGE_THUNK_DATA>(module, descriptor->OriginalFirstThunk)
             : nullptr;
-        for (; slot->u1.Function != 0; ++slot) {
+        for (; slot->u1.Function != 0; ++slot, name = name ? name + 1 : nullptr) {
             void** address = reinterpret_cast<void**>(&slot->u1.Function);
-            const bool match = name ? NamesFunction(module, *name, function)
-                                    : (exported && *address == exported);
-            if (name)
-                ++name;
+            const bool match = name ? NamesFunction(module, *name, function) : (exported && *address == exported);
             if (!match)
                 continue;
             m_slots.push_back({address, *address});
-            if (!m_original)
-                m_original = *address;
             Write(address, replacement);
         }
     }

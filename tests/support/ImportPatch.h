@@ -1,9 +1,6 @@
-// ImportPatch: redirects one imported function of one loaded module.
-//
-// Tests and the benchmark use it to watch the Win32 calls that a DLL makes
-// (GDI calls of the surface, heap calls of every module) without changing the
-// DLL: the module's import address table entry is replaced while the patch
-// lives and restored when it dies. The production code path is untouched.
+// ImportPatch: redirects one imported function of one loaded module while it
+// lives, so that tests and the benchmark can watch the Win32 calls a DLL makes
+// without changing the DLL.
 #pragma once
 
 #include <windows.h>
@@ -22,7 +19,7 @@ public:
 
     bool IsActive() const { return !m_slots.empty(); }
     // The address the first redirected entry held before: call it to forward.
-    void* GetOriginal() const { return m_original; }
+    void* GetOriginal() const { return m_slots.empty() ? nullptr : m_slots.front().previous; }
 
 private:
     struct Slot {
@@ -32,5 +29,4 @@ private:
     static void Write(void** address, void* value);
 
     std::vector<Slot> m_slots;
-    void* m_original = nullptr;
 };

@@ -1,8 +1,6 @@
-// GdiCallRecorder: records the GDI calls that libTavo_Windows.dll makes.
-//
-// While a recorder lives, the DLL's imports of the drawing, selection and
-// object calls are redirected (ImportPatch) to functions that note the call
-// and then forward it to GDI, so pixels are still drawn. One at a time.
+// GdiCallRecorder: while it lives, redirects libTavo_Windows.dll's imports of
+// the drawing, selection and object calls (ImportPatch) to functions that note
+// the call and forward it to GDI, so pixels are still drawn. One at a time.
 #pragma once
 
 #include "ImportPatch.h"
@@ -19,24 +17,24 @@ struct GdiCall {
         PolyPolyline, Polygon, Rectangle, Ellipse, TextOut, SelectObject,
         CreatePen, CreateBrush, CreateFont, DeleteObject, SetTextAlign, SetTextColor,
     };
+    bool IsCreation() const { return kind >= CreatePen && kind <= CreateFont; }
+
     Kind kind = PolyPolyline;
-    // PolyPolyline: every polyline's points, the count array, its values and
-    // their number. Polygon: its points.
-    std::vector<POINT> points;
-    const DWORD* counts = nullptr;
-    std::vector<DWORD> countValues;
-    int count = 0;
-    // Rectangle, Ellipse: left, top, right, bottom. TextOut: x, y and the text.
+    // Rectangle, Ellipse: left, top, right, bottom. TextOut: x, y.
     std::array<int, 4> box = {};
-    std::string text;
-    // SelectObject: the object selected and the one it displaced. Create*:
-    // the object made. DeleteObject: the object and (value) whether it went.
+    // SelectObject: the object selected. Create*: the object made. DeleteObject: the object.
     HGDIOBJ object = nullptr;
-    HGDIOBJ displaced = nullptr;
-    // CreateBrush: the style; CreateFont: the height; SetTextAlign: the flags.
+    // CreateBrush: the style; CreateFont: the height; SetTextAlign: the flags;
+    // DeleteObject: whether the object went.
     UINT value = 0;
-    // CreatePen, CreateBrush, SetTextColor.
-    COLORREF colour = 0;
+    COLORREF colour = 0;         // CreatePen, CreateBrush, SetTextColor
+    HGDIOBJ displaced = nullptr; // SelectObject: the object it displaced
+    std::string text = {};       // TextOut
+    // PolyPolyline: every polyline's points, the count array and its values.
+    // Polygon: its points.
+    std::vector<POINT> points = {};
+    const DWORD* counts = nullptr;
+    std::vector<DWORD> countValues = {};
 };
 
 class GdiCallRecorder {
@@ -51,14 +49,12 @@ public:
 
     const std::vector<GdiCall>& GetCalls() const { return m_calls; }
     void Clear() { m_calls.clear(); }
-    // Long runs only count objects: they keep no calls.
-    void SetKeepCalls(bool keep) { m_keepCalls = keep; }
     std::vector<GdiCall> Of(GdiCall::Kind kind) const;
     int CountOf(GdiCall::Kind kind) const { return static_cast<int>(Of(kind).size()); }
 
-    // Objects the DLL created and has not deleted yet.
-    int GetLiveObjectCount() const { return m_created - m_deleted; }
+    // Objects the DLL created, and those it has not deleted yet; Clear keeps both.
     int GetCreatedCount() const { return m_created; }
+    int GetLiveObjectCount() const { return m_created - m_deleted; }
 
     // Used by the recording functions.
     static GdiCallRecorder* Current() { return s_current; }
@@ -72,5 +68,4 @@ private:
     std::vector<GdiCall> m_calls;
     int m_created = 0;
     int m_deleted = 0;
-    bool m_keepCalls = true;
 };

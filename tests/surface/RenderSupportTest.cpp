@@ -32,18 +32,15 @@ std::vector<std::uint32_t> ReadPng(const std::string& path, UINT& width, UINT& h
         ComPtr<IWICImagingFactory> factory;
         ComPtr<IWICBitmapDecoder> decoder;
         ComPtr<IWICBitmapFrameDecode> frame;
-        ComPtr<IWICFormatConverter> converter;
+        ComPtr<IWICBitmapSource> converted;
         const std::wstring widePath(path.begin(), path.end());
         if (SUCCEEDED(CoCreateInstance(CLSID_WICImagingFactory, nullptr, CLSCTX_INPROC_SERVER, IID_PPV_ARGS(&factory)))
             && SUCCEEDED(factory->CreateDecoderFromFilename(widePath.c_str(), nullptr, GENERIC_READ,
                                                             WICDecodeMetadataCacheOnDemand, &decoder))
             && SUCCEEDED(decoder->GetFrame(0, &frame)) && SUCCEEDED(frame->GetSize(&width, &height))
-            && SUCCEEDED(factory->CreateFormatConverter(&converter))
-            && SUCCEEDED(converter->Initialize(frame.Get(), GUID_WICPixelFormat32bppBGRA, WICBitmapDitherTypeNone,
-                                               nullptr, 0.0, WICBitmapPaletteTypeCustom))) {
+            && SUCCEEDED(WICConvertBitmapSource(GUID_WICPixelFormat32bppBGRA, frame.Get(), &converted))) {
             pixels.resize(static_cast<size_t>(width) * height);
-            if (FAILED(converter->CopyPixels(nullptr, width * 4, width * height * 4,
-                                             reinterpret_cast<BYTE*>(pixels.data()))))
+            if (FAILED(converted->CopyPixels(nullptr, width * 4, width * height * 4, reinterpret_cast<BYTE*>(pixels.data()))))
                 pixels.clear();
         }
     }
@@ -53,7 +50,7 @@ std::vector<std::uint32_t> ReadPng(const std::string& path, UINT& width, UINT& h
 
 } // namespace
 
-TEST(PngWriter, WritesOpaquePixelsTopDown)
+TEST(PngWriter, WritesOpaquePixelsTopDownAndReportsWhatItCannotWrite)
 {
     DibCanvas canvas(8, 4, RGB(255, 255, 255));
     SetPixelV(canvas.GetDC(), 0, 0, RGB(255, 0, 0));
@@ -70,11 +67,7 @@ TEST(PngWriter, WritesOpaquePixelsTopDown)
     EXPECT_EQ(0xFFFF0000u, pixels[0]) << "red, opaque, in the top-left corner";
     EXPECT_EQ(0xFF0000FFu, pixels[31]) << "blue, opaque, in the bottom-right corner";
     EXPECT_EQ(0xFFFFFFFFu, pixels[1]);
-}
 
-TEST(PngWriter, ReportsAFileThatCannotBeWritten)
-{
-    DibCanvas canvas(8, 4);
     EXPECT_NE("", WritePng(canvas, "Z:\\no such folder\\at all\\picture.png"));
     DibCanvas empty(0, 0);
     EXPECT_NE("", WritePng(empty, TempPngPath()));

@@ -8,6 +8,17 @@
 static_assert(!std::is_copy_constructible_v<Tavo_WiWin32Surface>, "a surface owns GDI objects");
 static_assert(!std::is_copy_assignable_v<Tavo_WiWin32Surface>, "a surface owns GDI objects");
 
+namespace {
+
+unsigned AttrChanges(const Tavo_WiWin32Surface& surface)
+{
+    Tavo_GrSurfaceStats stats;
+    surface.FetchStats(stats);
+    return stats.Get(Tavo_GrSurfaceStats::AttrChanges);
+}
+
+} // namespace
+
 TEST_F(SurfaceTest, FirstAttributeFlushesAndBuildsPenBrushAndTextColourInItsColour)
 {
     const struct {
@@ -24,24 +35,19 @@ TEST_F(SurfaceTest, FirstAttributeFlushesAndBuildsPenBrushAndTextColourInItsColo
         SCOPED_TRACE(testing::Message() << "colour " << int(c.attr.GetColor()) << " b/w " << c.blackAndWhite);
         CreateSurface();
         m_surface->SetBlackAndWhiteFlag(c.blackAndWhite);
-        m_recorder->Clear();
         m_surface->SetCurrentAttr(&c.attr);
 
-        EXPECT_EQ(1u, Stat(Tavo_GrSurfaceStats::AttrChanges)) << "the first attribute counts as a change";
-        const std::vector<GdiCall>& calls = m_recorder->GetCalls();
+        EXPECT_EQ(1u, AttrChanges(*m_surface)) << "the first attribute counts as a change";
+        const std::vector<GdiCall>& calls = m_recorder.GetCalls();
         ASSERT_GE(calls.size(), 5u);
         for (int i = 0; i < 5; ++i)
-            EXPECT_TRUE(calls[i].kind == GdiCall::PolyPolyline && calls[i].count == 0) << "flush first, call " << i;
-        const std::vector<GdiCall> pens = m_recorder->Of(GdiCall::CreatePen);
-        const std::vector<GdiCall> brushes = m_recorder->Of(GdiCall::CreateBrush);
-        const std::vector<GdiCall> textColours = m_recorder->Of(GdiCall::SetTextColor);
-        ASSERT_EQ(1u, pens.size());
-        ASSERT_EQ(1u, brushes.size());
-        ASSERT_EQ(1u, textColours.size());
-        EXPECT_EQ(c.colour, pens[0].colour);
-        EXPECT_EQ(c.colour, brushes[0].colour);
-        EXPECT_EQ(c.brushStyle, brushes[0].value);
-        EXPECT_EQ(c.colour, textColours[0].colour);
+            EXPECT_TRUE(calls[i].kind == GdiCall::PolyPolyline && calls[i].countValues.empty()) << "flush first, " << i;
+        for (const GdiCall::Kind kind : {GdiCall::CreatePen, GdiCall::CreateBrush, GdiCall::SetTextColor}) {
+            const std::vector<GdiCall> made = m_recorder.Of(kind);
+            ASSERT_EQ(1u, made.size()) << kind;
+            EXPECT_EQ(c.colour, made[0].colour) << kind;
+        }
+        EXPECT_EQ(c.brushStyle, m_recorder.Of(GdiCall::CreateBrush)[0].value);
     }
 }
 
@@ -67,19 +73,19 @@ TEST_F(SurfaceTest, AttributeChangeRebuildsOnlyWhatChangedAndFlushesOnlyOnColour
         CreateSurface();
         Tavo_GrAttr first = Outline(kRed, 10);
         m_surface->DrawLine(a, b, &first);
-        m_recorder->Clear();
+        m_recorder.Clear();
         m_surface->DrawLine(a, b, &c.next);
 
         std::vector<int> calls(8); // CreatePen .. SetTextColor are the last six kinds
-        for (const GdiCall& call : m_recorder->GetCalls()) {
+        for (const GdiCall& call : m_recorder.GetCalls()) {
             if (call.kind >= GdiCall::CreatePen)
                 ++calls[call.kind - GdiCall::CreatePen];
-            const bool line = call.kind == GdiCall::PolyPolyline && call.count > 0;
+            const bool line = call.kind == GdiCall::PolyPolyline && !call.countValues.empty();
             calls[6] += line && calls[0] + calls[1] + calls[2] == 0;
             calls[7] += line;
         }
         EXPECT_EQ(c.calls, calls);
-        EXPECT_EQ(c.changes, Stat(Tavo_GrSurfaceStats::AttrChanges));
+        EXPECT_EQ(c.changes, AttrChanges(*m_surface));
     }
 }
 
@@ -97,20 +103,15 @@ TEST_F(SurfaceTest, FontHeightIsScaledRoundedAndKeptAtTheMinimum)
     for (const auto& c : cases) {
         SCOPED_TRACE(testing::Message() << (c.minFont ? c.minFont : "unset") << ", " << c.charHeight << " at "
                                         << c.scale);
-        {
-            ScopedEnvironment minFont("BRY_VWR_MINFONT", c.minFont);
-            CreateSurface();
-        }
-        Bind(c.scale);
-        m_recorder->Clear();
+        CreateSurface("BRY_VWR_MINFONT", c.minFont, c.scale);
         Tavo_GrAttr attr = Outline(kBlack, c.charHeight);
         Tavo_GrDPoint p = At(10, 40);
         m_surface->DrawText("x", p, &attr);
         std::vector<int> fonts;
-        for (const GdiCall& font : m_recorder->Of(GdiCall::CreateFont))
+        for (const GdiCall& font : m_recorder.Of(GdiCall::CreateFont))
             fonts.push_back(static_cast<int>(font.value));
         EXPECT_EQ(c.fonts, fonts);
-        EXPECT_TRUE(!c.fonts.empty() || m_recorder->CountOf(GdiCall::TextOut) == 0) << "no font, no text";
+        EXPECT_TRUE(!c.fonts.empty() || m_recorder.CountOf(GdiCall::TextOut) == 0) << "no font, no text";
         EndPass();
     }
 }

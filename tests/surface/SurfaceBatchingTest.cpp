@@ -2,7 +2,6 @@
 // fixed flush order, full batches and the shared point-count arrays.
 #include "SurfaceFixture.h"
 
-#include <algorithm>
 #include <climits>
 
 using Points = std::vector<POINT>;
@@ -17,23 +16,17 @@ protected:
     {
         m_attr = attr;
         m_surface->SetCurrentAttr(&m_attr);
-        m_recorder->Clear();
+        m_recorder.Clear();
     }
 
     // The drawing and selection calls, in order.
     std::vector<GdiCall> DrawingCalls() const
     {
-        std::vector<GdiCall> calls = m_recorder->GetCalls();
+        std::vector<GdiCall> calls = m_recorder.GetCalls();
         calls.erase(std::remove_if(calls.begin(), calls.end(),
                                    [](const GdiCall& call) { return call.kind > GdiCall::SelectObject; }),
                     calls.end());
         return calls;
-    }
-
-    int NonEmptyPolyPolylines() const
-    {
-        const std::vector<GdiCall> calls = m_recorder->Of(GdiCall::PolyPolyline);
-        return static_cast<int>(std::count_if(calls.begin(), calls.end(), [](const GdiCall& c) { return c.count > 0; }));
     }
 
     Tavo_GrAttr m_attr;
@@ -43,21 +36,7 @@ protected:
     Tavo_GrDRect m_rect{10, 20, 30, 40};
 };
 
-TEST_F(BatchingTest, FlushOfEmptyBatchesIsFiveEmptyPolyPolylinesAndTheNullBrushRoundTrip)
-{
-    Prepare(Outline(kRed));
-    m_surface->Flush();
-
-    const std::vector<GdiCall>& calls = m_recorder->GetCalls();
-    ASSERT_EQ(7u, calls.size());
-    for (int i = 0; i < 5; ++i)
-        EXPECT_TRUE(calls[i].kind == GdiCall::PolyPolyline && calls[i].count == 0) << i;
-    EXPECT_EQ(GetStockObject(NULL_BRUSH), calls[5].object);
-    EXPECT_EQ(GdiCall::SelectObject, calls[6].kind);
-    EXPECT_EQ(calls[5].displaced, calls[6].object) << "the displaced brush goes back";
-}
-
-TEST_F(BatchingTest, OutlineKindsAreEmittedInTheFixedOrderWithTheSharedCountArrays)
+TEST_F(BatchingTest, OutlineKindsAndEmptyBatchesAreEmittedInTheFixedOrderWithTheSharedCountArrays)
 {
     Prepare(Outline(kRed));
     // Issued in the reverse of the flush order.
@@ -92,17 +71,21 @@ TEST_F(BatchingTest, OutlineKindsAreEmittedInTheFixedOrderWithTheSharedCountArra
     EXPECT_EQ(GdiCall::SelectObject, calls[8].kind);
     EXPECT_EQ(calls[5].displaced, calls[8].object);
 
-    // Another surface passes the same count arrays.
-    Tavo_WiWin32Surface other;
-    other.SetDC(m_canvas.GetDC());
-    other.BeginDrawing(nullptr);
-    m_recorder->Clear();
-    other.Flush();
-    other.EndDrawing();
-    const std::vector<GdiCall> second = m_recorder->Of(GdiCall::PolyPolyline);
-    ASSERT_EQ(5u, second.size());
-    for (int i = 0; i < 5; ++i)
-        EXPECT_EQ(calls[i].counts, second[i].counts) << i;
+
+    // Another surface flushing empty batches: five empty PolyPolylines on the
+    // same count arrays, then the null brush round trip.
+    CreateSurface();
+    Prepare(Outline(kRed));
+    m_surface->Flush();
+    const std::vector<GdiCall>& empty = m_recorder.GetCalls();
+    ASSERT_EQ(7u, empty.size());
+    for (int i = 0; i < 5; ++i) {
+        EXPECT_TRUE(empty[i].kind == GdiCall::PolyPolyline && empty[i].countValues.empty()) << i;
+        EXPECT_EQ(calls[i].counts, empty[i].counts) << i;
+    }
+    EXPECT_EQ(GetStockObject(NULL_BRUSH), empty[5].object);
+    EXPECT_EQ(GdiCall::SelectObject, empty[6].kind);
+    EXPECT_EQ(empty[5].displaced, empty[6].object) << "the displaced brush goes back";
 }
 
 TEST_F(BatchingTest, FilledKindsAreEmittedInTheFixedOrder)
@@ -117,14 +100,10 @@ TEST_F(BatchingTest, FilledKindsAreEmittedInTheFixedOrder)
     m_surface->Flush();
 
     const std::vector<GdiCall> calls = DrawingCalls();
-    std::vector<std::pair<GdiCall::Kind, int>> kinds; // and the polylines of each PolyPolyline
+    std::string kinds; // the initial of each call, and the polylines of each PolyPolyline
     for (const GdiCall& call : calls)
-        kinds.emplace_back(call.kind, call.count);
-    const GdiCall::Kind P = GdiCall::PolyPolyline, S = GdiCall::SelectObject;
-    EXPECT_EQ((std::vector<std::pair<GdiCall::Kind, int>>{{P, 1}, {P, 1}, {P, 0}, {P, 1}, {GdiCall::Polygon, 0},
-                                                          {P, 0}, {GdiCall::Rectangle, 0}, {S, 0}, {S, 0},
-                                                          {GdiCall::Ellipse, 0}}),
-              kinds)
+        kinds += std::string(1, "PGRETS"[call.kind]) + std::to_string(call.countValues.size()) + " ";
+    EXPECT_EQ("P1 P1 P0 P1 G0 P0 R0 S0 S0 E0 ", kinds)
         << "dots, lines, uniangles, hollow and filled triangles, hollow and filled rectangles, hollow and filled "
            "circles";
     ASSERT_EQ(10u, calls.size());
@@ -140,23 +119,23 @@ TEST_F(BatchingTest, FullBatchIsEmittedInsideTheAddAndLeftEmpty)
     Prepare(Outline(kRed));
     for (int i = 1; i < lines; ++i)
         m_surface->DrawLine(m_dot, m_lineEnd, &m_attr);
-    EXPECT_EQ(0, NonEmptyPolyPolylines());
+    EXPECT_TRUE(Polylines().empty());
     m_surface->DrawLine(m_dot, m_lineEnd, &m_attr);
-    const std::vector<GdiCall> emitted = m_recorder->Of(GdiCall::PolyPolyline);
+    const std::vector<GdiCall> emitted = m_recorder.Of(GdiCall::PolyPolyline);
     ASSERT_EQ(1u, emitted.size());
-    EXPECT_EQ(lines, emitted[0].count);
+    EXPECT_EQ(size_t(lines), emitted[0].countValues.size());
 
     Prepare(Filled(kRed)); // flushes the batches, then forgets those calls
     for (int i = 1; i < triangles; ++i)
         m_surface->DrawTriangle(m_big, &m_attr);
-    EXPECT_EQ(0, m_recorder->CountOf(GdiCall::Polygon));
+    EXPECT_EQ(0, m_recorder.CountOf(GdiCall::Polygon));
     m_surface->DrawTriangle(m_big, &m_attr);
-    EXPECT_EQ(triangles, m_recorder->CountOf(GdiCall::Polygon));
+    EXPECT_EQ(triangles, m_recorder.CountOf(GdiCall::Polygon));
 
-    m_recorder->Clear();
+    m_recorder.Clear();
     m_surface->Flush();
-    EXPECT_EQ(0, NonEmptyPolyPolylines());
-    EXPECT_EQ(0, m_recorder->CountOf(GdiCall::Polygon));
+    EXPECT_TRUE(Polylines().empty());
+    EXPECT_EQ(0, m_recorder.CountOf(GdiCall::Polygon));
 }
 
 TEST_F(BatchingTest, FilledRectanglesAndCirclesKeepThirtyTwoBitCoordinates)
@@ -167,19 +146,19 @@ TEST_F(BatchingTest, FilledRectanglesAndCirclesKeepThirtyTwoBitCoordinates)
     Tavo_GrDRect extreme{INT_MIN, INT_MIN, INT_MAX, INT_MAX};
     m_surface->DrawRect(extreme, &m_attr);
     m_surface->Flush();
-    const std::vector<GdiCall> rects = m_recorder->Of(GdiCall::Rectangle);
+    const std::vector<GdiCall> rects = m_recorder.Of(GdiCall::Rectangle);
     ASSERT_EQ(2u, rects.size());
     EXPECT_EQ((Box{-70000, H - 100000, 40000, H + 5 + 1}), rects[0].box) << "40000, not -25536";
     EXPECT_EQ((Box{INT_MIN, H - INT_MAX, INT_MAX, INT_MAX}), rects[1].box) << "saturated";
-    EXPECT_EQ(kWidth * kHeight, CountColour(kRed)) << "the rectangles cover the whole canvas";
+    EXPECT_EQ(kWidth * kHeight, RedPixels()) << "the rectangles cover the whole canvas";
 
     m_canvas.Fill(RGB(255, 255, 255));
     Tavo_GrDPoint centre = At(40000, 50);
     m_surface->DrawCircle(centre, 39950, &m_attr);
     m_surface->Flush();
-    const std::vector<GdiCall> ellipses = m_recorder->Of(GdiCall::Ellipse);
+    const std::vector<GdiCall> ellipses = m_recorder.Of(GdiCall::Ellipse);
     ASSERT_EQ(1u, ellipses.size());
     EXPECT_EQ((Box{50, H - 39950 - 50, 79950, H + 39950 - 50}), ellipses[0].box);
-    EXPECT_TRUE(IsColour(60, kHeight - 50, kRed)) << "the left edge reaches into the canvas";
-    EXPECT_FALSE(IsColour(10, kHeight - 50, kRed));
+    EXPECT_TRUE(IsRed(60, kHeight - 50)) << "the left edge reaches into the canvas";
+    EXPECT_FALSE(IsRed(10, kHeight - 50));
 }

@@ -2,15 +2,8 @@
 // DIB section (and on the recorded calls where pixels cannot tell).
 #include "SurfaceFixture.h"
 
-#include <algorithm>
-
 class DrawingTest : public SurfaceTest {
 protected:
-    int RedIn(int left, int top, int right, int bottom) const
-    {
-        return m_canvas.CountPixels(ColourOf(kRed), left, top, right, bottom);
-    }
-
     Tavo_GrAttr m_red = Outline(kRed);
     Tavo_GrAttr m_redFilled = Filled(kRed);
 };
@@ -20,40 +13,33 @@ TEST_F(DrawingTest, DotIsExactlyOnePixelAtTheFlippedPosition)
     Tavo_GrDPoint p = At(17, 30);
     m_surface->DrawDot(p, &m_red);
     EndPass();
-    EXPECT_EQ(1, CountColour(kRed));
-    EXPECT_TRUE(IsColour(17, kHeight - 30, kRed));
+    EXPECT_EQ(1, RedPixels());
+    EXPECT_TRUE(IsRed(17, kHeight - 30));
 }
 
-TEST_F(DrawingTest, RectangleEdgesAreInclusive)
+TEST_F(DrawingTest, RectangleEdgesAreInclusiveAndAOnePointRectangleCoversOnePixel)
 {
-    Tavo_GrDRect filled{10, 20, 29, 34}, column{40, 40, 40, 41}, row{60, 40, 61, 40};
+    Tavo_GrDRect filled{10, 20, 29, 34}, column{40, 40, 40, 41}, row{60, 40, 61, 40}, point{80, 40, 80, 40};
     m_surface->DrawRect(filled, &m_redFilled);
     m_surface->DrawRect(column, &m_redFilled);
     m_surface->DrawRect(row, &m_redFilled);
+    m_surface->DrawRect(point, &m_redFilled);
     EndPass();
-    EXPECT_EQ(20 * 15, RedIn(10, kHeight - 34, 30, kHeight - 19));
-    EXPECT_EQ(2, RedIn(40, kHeight - 41, 41, kHeight - 39));
-    EXPECT_EQ(2, RedIn(60, kHeight - 40, 62, kHeight - 39));
-    EXPECT_EQ(20 * 15 + 2 + 2, CountColour(kRed));
+    // Wine's DIB engine draws nothing for a Rectangle one pixel wide and one
+    // high (Windows draws the pixel), so that one is checked on the call.
+    const std::vector<GdiCall> rects = m_recorder.Of(GdiCall::Rectangle);
+    ASSERT_EQ(4u, rects.size());
+    EXPECT_EQ((std::array<int, 4>{80, kHeight - 40, 81, kHeight - 40 + 1}), rects[3].box);
+    EXPECT_EQ(20 * 15, RedPixelsIn(10, kHeight - 34, 30, kHeight - 19));
+    EXPECT_EQ(2, RedPixelsIn(40, kHeight - 41, 41, kHeight - 39));
+    EXPECT_EQ(2, RedPixelsIn(60, kHeight - 40, 62, kHeight - 39));
+    EXPECT_EQ(20 * 15 + 2 + 2, RedPixelsIn(0, 0, 70, kHeight)) << "nothing else left of the one-pixel rectangle";
 
-    m_canvas.Fill(RGB(255, 255, 255));
     CreateSurface();
     m_surface->DrawRect(filled, &m_red);
     EndPass();
-    EXPECT_EQ(2 * 21 + 2 * 14, CountColour(kRed)) << "outline through (l, t) .. (r + 1, b + 1)";
-    EXPECT_FALSE(IsColour(20, kHeight - 27, kRed)) << "inside stays empty";
-}
-
-// Wine's DIB engine draws nothing for a Rectangle one pixel wide and one high
-// (Windows draws the pixel), so the one-pixel rectangle is checked on the call.
-TEST_F(DrawingTest, DegenerateFilledRectangleIsARectangleCallCoveringOnePixel)
-{
-    Tavo_GrDRect r{40, 40, 40, 40};
-    m_surface->DrawRect(r, &m_redFilled);
-    EndPass();
-    const std::vector<GdiCall> rects = m_recorder->Of(GdiCall::Rectangle);
-    ASSERT_EQ(1u, rects.size());
-    EXPECT_EQ((std::array<int, 4>{40, kHeight - 40, 41, kHeight - 40 + 1}), rects[0].box);
+    EXPECT_EQ(2 * 21 + 2 * 14, RedPixels()) << "outline through (l, t) .. (r + 1, b + 1)";
+    EXPECT_FALSE(IsRed(20, kHeight - 27)) << "inside stays empty";
 }
 
 TEST_F(DrawingTest, VerticalLinesBeyondTheSurfaceAreClampedSlantedOnesAreNot)
@@ -62,31 +48,24 @@ TEST_F(DrawingTest, VerticalLinesBeyondTheSurfaceAreClampedSlantedOnesAreNot)
     m_surface->DrawLine(a, b, &m_red);
     m_surface->DrawLine(a, c, &m_red);
     EndPass();
-    std::vector<GdiCall> lines = m_recorder->Of(GdiCall::PolyPolyline);
-    lines.erase(std::remove_if(lines.begin(), lines.end(), [](const GdiCall& call) { return call.count == 0; }),
-                lines.end());
+    const std::vector<GdiCall> lines = Polylines();
     ASSERT_EQ(1u, lines.size());
     EXPECT_EQ((std::vector<POINT>{{30, kHeight}, {30, -1}, {30, kHeight + 100}, {31, -50}}), lines[0].points);
-    EXPECT_EQ(kHeight, RedIn(30, 0, 31, kHeight)) << "the clamped line still covers the column";
+    EXPECT_EQ(kHeight, RedPixelsIn(30, 0, 31, kHeight)) << "the clamped line still covers the column";
 }
 
 TEST_F(DrawingTest, ThickeningWidensVerticalLinesToTheRightOnly)
 {
-    struct Case {
+    const struct {
         const char* environment; // BRY_VWR_THICKENVERTICALLINE
         int thicken;             // given to SetThickenVertLine, 0: not called
         bool gateClosed;         // a thickening gate of 0
         int columns;
-    };
-    const Case cases[] = {{nullptr, 2, false, 3}, {"2", 0, false, 3}, {nullptr, 2, true, 1}};
-    for (const Case& c : cases) {
+    } cases[] = {{nullptr, 2, false, 3}, {"2", 0, false, 3}, {nullptr, 2, true, 1}};
+    for (const auto& c : cases) {
         SCOPED_TRACE(testing::Message() << (c.environment ? c.environment : "unset") << ", " << c.thicken << ", gate "
                                         << (c.gateClosed ? "0" : "default"));
-        m_canvas.Fill(RGB(255, 255, 255));
-        {
-            ScopedEnvironment thicken("BRY_VWR_THICKENVERTICALLINE", c.environment);
-            CreateSurface();
-        }
+        CreateSurface("BRY_VWR_THICKENVERTICALLINE", c.environment);
         if (c.thicken)
             m_surface->SetThickenVertLine(c.thicken);
         if (c.gateClosed)
@@ -96,8 +75,8 @@ TEST_F(DrawingTest, ThickeningWidensVerticalLinesToTheRightOnly)
         m_surface->DrawLine(d, e, &m_red);
         EndPass();
         for (int x = 9; x <= 13; ++x)
-            EXPECT_EQ(x >= 10 && x < 10 + c.columns ? 40 : 0, RedIn(x, 0, x + 1, kHeight)) << "column " << x;
-        EXPECT_EQ(40, RedIn(0, kHeight - 80, kWidth, kHeight - 79)) << "the horizontal line stays one row";
+            EXPECT_EQ(x >= 10 && x < 10 + c.columns ? 40 : 0, RedPixelsIn(x, 0, x + 1, kHeight)) << "column " << x;
+        EXPECT_EQ(40, RedPixelsIn(0, kHeight - 80, kWidth, kHeight - 79)) << "the horizontal line stays one row";
     }
 }
 
@@ -112,5 +91,5 @@ TEST_F(DrawingTest, BadInputDrawsNothing)
     m_surface->DrawText(nullptr, box, &text, 20);
     m_surface->DrawText("", box, &text, 20);
     EndPass();
-    EXPECT_EQ(0, CountColour(kRed));
+    EXPECT_EQ(0, RedPixels());
 }

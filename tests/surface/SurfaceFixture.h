@@ -13,6 +13,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <memory>
 #include <ostream>
 
@@ -20,12 +21,6 @@
 #undef DrawText
 
 enum TestColour : char { kBlack = 0, kBlue = 1, kRed = 4 };
-
-// The COLORREF the surface draws a palette index with.
-inline COLORREF ColourOf(char index)
-{
-    return Tavo_WiLibrary::GetPalette()->GetWin32Color(index, false);
-}
 
 inline Tavo_GrAttr Outline(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault)
 {
@@ -37,33 +32,11 @@ inline Tavo_GrAttr Filled(char colour, int charHeight = 0, char align = Tavo_GrA
     return Tavo_GrAttr(colour, 1, charHeight, align);
 }
 
-inline Tavo_GrDPoint At(int x, int y)
-{
-    return Tavo_GrDPoint{x, y};
-}
+inline Tavo_GrDPoint At(int x, int y) { return Tavo_GrDPoint{x, y}; }
 
 // POINT is a global type: its comparison and printing must be found there.
-inline bool operator==(const POINT& a, const POINT& b)
-{
-    return a.x == b.x && a.y == b.y;
-}
-
-inline void PrintTo(const POINT& point, std::ostream* out)
-{
-    *out << "(" << point.x << ", " << point.y << ")";
-}
-
-// Sets an environment variable (null: unset) while it lives, then unsets it.
-class ScopedEnvironment {
-public:
-    ScopedEnvironment(const char* name, const char* value) : m_name(name) { SetEnvironmentVariableA(name, value); }
-    ~ScopedEnvironment() { SetEnvironmentVariableA(m_name, nullptr); }
-    ScopedEnvironment(const ScopedEnvironment&) = delete;
-    ScopedEnvironment& operator=(const ScopedEnvironment&) = delete;
-
-private:
-    const char* m_name;
-};
+inline bool operator==(const POINT& a, const POINT& b) { return a.x == b.x && a.y == b.y; }
+inline void PrintTo(const POINT& point, std::ostream* out) { *out << "(" << point.x << ", " << point.y << ")"; }
 
 class SurfaceTest : public ::testing::Test {
 protected:
@@ -73,24 +46,25 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(m_canvas.IsValid());
+        ASSERT_TRUE(m_recorder.IsActive());
         CreateSurface();
-        m_recorder = std::make_unique<GdiCallRecorder>();
-        ASSERT_TRUE(m_recorder->IsActive());
     }
 
-    // A new surface, reading the environment now.
-    void CreateSurface()
+    // A white canvas, no calls recorded and a new surface in a pass, which read
+    // the environment with `variable` (if any) set to `value`.
+    void CreateSurface(const char* variable = nullptr, const char* value = nullptr, double scale = 1.0)
     {
+        m_canvas.Fill(RGB(255, 255, 255));
+        if (variable)
+            SetEnvironmentVariableA(variable, value);
         m_surface = std::make_unique<Tavo_WiWin32Surface>();
-        Bind();
-    }
-
-    void Bind(double scale = 1.0)
-    {
+        if (variable)
+            SetEnvironmentVariableA(variable, nullptr);
         m_surface->SetDC(m_canvas.GetDC());
         m_surface->SetDeviceHeight(kHeight);
         m_surface->SetTransform(Tavo_GrTransform(scale, 0.0, 0.0));
         m_surface->BeginDrawing(nullptr);
+        m_recorder.Clear();
     }
 
     void EndPass()
@@ -99,16 +73,24 @@ protected:
         m_surface->EndDrawing();
     }
 
-    int CountColour(char colour) const { return m_canvas.CountPixels(ColourOf(colour)); }
-    bool IsColour(int x, int y, char colour) const { return m_canvas.GetPixel(x, y) == ColourOf(colour); }
-    unsigned Stat(Tavo_GrSurfaceStats::Counter counter) const
+    // The PolyPolyline calls that drew something.
+    std::vector<GdiCall> Polylines() const
     {
-        Tavo_GrSurfaceStats stats;
-        m_surface->FetchStats(stats);
-        return stats.Get(counter);
+        std::vector<GdiCall> calls = m_recorder.Of(GdiCall::PolyPolyline);
+        calls.erase(std::remove_if(calls.begin(), calls.end(), [](const GdiCall& c) { return c.countValues.empty(); }),
+                    calls.end());
+        return calls;
     }
 
+    static COLORREF Red() { return Tavo_WiLibrary::GetPalette()->GetWin32Color(kRed, false); }
+    int RedPixels() const { return m_canvas.CountPixels(Red()); }
+    int RedPixelsIn(int left, int top, int right, int bottom) const
+    {
+        return m_canvas.CountPixels(Red(), left, top, right, bottom);
+    }
+    bool IsRed(int x, int y) const { return m_canvas.GetPixel(x, y) == Red(); }
+
     DibCanvas m_canvas{kWidth, kHeight};
+    GdiCallRecorder m_recorder; // every GDI call of the surface
     std::unique_ptr<Tavo_WiWin32Surface> m_surface;
-    std::unique_ptr<GdiCallRecorder> m_recorder; // every GDI call of the surface
 };

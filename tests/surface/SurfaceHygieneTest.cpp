@@ -6,14 +6,10 @@
 #include "Tavo_GrDrawingBuilder.h"
 #include "Tavo_GrMapping.h"
 
-namespace {
-
-std::vector<HGDIOBJ> CurrentObjects(HDC dc)
+static std::vector<HGDIOBJ> CurrentObjects(HDC dc)
 {
     return {GetCurrentObject(dc, OBJ_PEN), GetCurrentObject(dc, OBJ_BRUSH), GetCurrentObject(dc, OBJ_FONT)};
 }
-
-} // namespace
 
 TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
 {
@@ -24,7 +20,6 @@ TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
                      : ending == Ending::Destroyed ? "surface destroyed in the middle of a pass"
                                                    : "surface bound to another DC in the middle of a pass");
         CreateSurface();
-        m_recorder->Clear();
         Tavo_GrAttr attr = Filled(kRed, 20);
         Tavo_GrDRect r{10, 10, 50, 50};
         Tavo_GrDPoint p{10, 80};
@@ -38,24 +33,21 @@ TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
             m_surface->SetDC(nullptr);
 
         EXPECT_EQ(before, CurrentObjects(m_canvas.GetDC()));
-        int created = 0;
-        for (const GdiCall& call : m_recorder->GetCalls()) {
-            if (call.kind == GdiCall::CreatePen || call.kind == GdiCall::CreateBrush || call.kind == GdiCall::CreateFont) {
-                ++created;
-                EXPECT_EQ(0u, GetObjectType(call.object)) << "deleted";
-            }
-        }
-        EXPECT_EQ(3, created) << "pen, brush and font";
-        EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
+        const std::vector<GdiCall>& calls = m_recorder.GetCalls();
+        EXPECT_EQ(3, std::count_if(calls.begin(), calls.end(), [](const GdiCall& c) { return c.IsCreation(); }))
+            << "pen, brush and font";
+        for (const GdiCall& call : calls)
+            EXPECT_TRUE(!call.IsCreation() || GetObjectType(call.object) == 0) << "deleted";
+        EXPECT_EQ(0, m_recorder.GetLiveObjectCount());
     }
     // After EndDrawing the surface holds nothing: its destructor releases nothing.
     CreateSurface();
     Tavo_GrAttr attr = Filled(kRed, 20);
     m_surface->SetCurrentAttr(&attr);
     EndPass();
-    m_recorder->Clear();
+    m_recorder.Clear();
     m_surface.reset();
-    EXPECT_TRUE(m_recorder->GetCalls().empty());
+    EXPECT_TRUE(m_recorder.GetCalls().empty());
 }
 
 TEST_F(SurfaceTest, TenThousandPassesThroughTheCoreLeakNoGdiObject)
@@ -75,22 +67,21 @@ TEST_F(SurfaceTest, TenThousandPassesThroughTheCoreLeakNoGdiObject)
     Tavo_GrMapping mapping(&drawing, 5);
     mapping.SetDeviceWindowSize(kWidth, kHeight, true, nullptr);
     const std::vector<HGDIOBJ> before = CurrentObjects(m_canvas.GetDC());
-    m_recorder->SetKeepCalls(false);
-
     for (int pass = 0; pass < 10000; ++pass) {
         m_surface->SetDC(m_canvas.GetDC());
         drawing.Draw(*m_surface, mapping, nullptr);
+        m_recorder.Clear(); // the object counts stay
     }
 
-    EXPECT_GE(m_recorder->GetCreatedCount(), 10000 * 5);
-    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
+    EXPECT_GE(m_recorder.GetCreatedCount(), 10000 * 5);
+    EXPECT_EQ(0, m_recorder.GetLiveObjectCount());
     EXPECT_EQ(before, CurrentObjects(m_canvas.GetDC()));
-    EXPECT_GT(CountColour(kRed), 1000) << "the passes did draw";
+    EXPECT_GT(RedPixels(), 1000) << "the passes did draw";
 
     // Without a device context nothing is drawn and nothing is kept either.
     m_canvas.Fill(RGB(255, 255, 255));
     m_surface->SetDC(nullptr);
     drawing.Draw(*m_surface, mapping, nullptr);
-    EXPECT_EQ(0, m_recorder->GetLiveObjectCount());
-    EXPECT_EQ(0, CountColour(kRed));
+    EXPECT_EQ(0, m_recorder.GetLiveObjectCount());
+    EXPECT_EQ(0, RedPixels());
 }
