@@ -13,7 +13,6 @@ namespace {
 
 constexpr int HostX = 200;
 constexpr int HostY = 150;
-const CPoint NoPoint(-1, -1);
 
 class ParkedCursorTest : public ::testing::Test
 {
@@ -21,8 +20,6 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(monitor.Create(owner.Wnd(), Tavo_WiParkedCursorMonitor::ControlId));
-        ::SetForegroundWindow(host.Handle());
-        ::SetActiveWindow(host.Handle());
         ::SetCursorPos(HostX + 30, HostY + 40);
         TestWindow::Notes().clear();
     }
@@ -32,17 +29,21 @@ protected:
     // Pre-translates a message of the owner at a client point.
     void Relay(UINT message, int x, int y, WPARAM wParam = 0)
     {
-        MSG msg = {};
-        msg.hwnd = owner.Handle();
-        msg.message = message;
-        msg.wParam = wParam;
-        msg.lParam = MAKELPARAM(x, y);
+        MSG msg = {owner.Handle(), message, wParam, MAKELPARAM(x, y), 0, {0, 0}};
         monitor.RelayEvent(&msg);
     }
 
-    void FireParkTimer()
+    int FireParkTimer()
     {
         ::SendMessageA(monitor.GetSafeHwnd(), WM_TIMER, Tavo_WiParkedCursorMonitor::ParkTimerId, 0);
+        return monitor.IsParked();
+    }
+
+    // A move to a client point, then the park timer; whether a rest began.
+    int MoveAndFire(int x, int y)
+    {
+        Relay(WM_MOUSEMOVE, x, y);
+        return FireParkTimer();
     }
 
     // The wParam of every rest notification the owner received, in order.
@@ -55,24 +56,21 @@ protected:
         return result;
     }
 
-    TestWindow host{CRect(HostX, HostY, HostX + 400, HostY + 300)};
+    TestWindow host{CRect(HostX, HostY, HostX + 400, HostY + 300)};   // shown and activated
     TestWindow owner{CRect(0, 0, 300, 200), host.Handle()};
     Tavo_WiParkedCursorMonitor monitor;
 };
 
 TEST_F(ParkedCursorTest, RestBeginsWhenTheTimerFiresAfterAMoveAndEndsOnlyAtAMoveElsewhere)
 {
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0) << "no move, no rest";
+    EXPECT_EQ(FireParkTimer(), 0) << "no move, no rest";
     Relay(WM_MOUSEMOVE, 30, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 1);
+    EXPECT_EQ(FireParkTimer(), 1);
     // The park point is where the pointer is, in the owner's client coordinates.
     EXPECT_EQ(monitor.GetParkPoint(), CPoint(30, 40));
 
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();   // would end and begin the rest again had the move restarted the timer
+    MoveAndFire(30, 40);   // would end and begin the rest again had the move restarted the timer
     Relay(WM_NCMOUSEMOVE, 90, 90);
     Relay(WM_MOUSEWHEEL, 90, 90, MAKEWPARAM(0, 120));
     Relay(WM_KEYDOWN, 0, 0, 'A');
@@ -83,7 +81,7 @@ TEST_F(ParkedCursorTest, RestBeginsWhenTheTimerFiresAfterAMoveAndEndsOnlyAtAMove
     // One pixel away ends it.
     Relay(WM_MOUSEMOVE, 31, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
-    EXPECT_EQ(monitor.GetParkPoint(), NoPoint);
+    EXPECT_EQ(monitor.GetParkPoint(), CPoint(-1, -1));
     EXPECT_EQ(Notifications(), (std::vector<WPARAM>{1, 0}));
 }
 
@@ -92,17 +90,10 @@ TEST_F(ParkedCursorTest, HeldButtonKeepsTheMonitorIdleUntilReleaseAndALaterMove)
     Relay(WM_MOUSEMOVE, 30, 40);
     Relay(WM_LBUTTONDOWN, 30, 40, MK_LBUTTON);
     FireParkTimer();
-    Relay(WM_MOUSEMOVE, 35, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
-
+    EXPECT_EQ(MoveAndFire(35, 40), 0);
     Relay(WM_LBUTTONUP, 35, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0) << "a release starts no timer";
-
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 1);
+    EXPECT_EQ(FireParkTimer(), 0) << "a release starts no timer";
+    EXPECT_EQ(MoveAndFire(30, 40), 1);
     EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
 }
 
@@ -111,14 +102,10 @@ TEST_F(ParkedCursorTest, DoubleClickOrAnyButtonEndsARest)
     Relay(WM_MOUSEMOVE, 30, 40);
     Relay(WM_LBUTTONDOWN, 30, 40, MK_LBUTTON);
     Relay(WM_LBUTTONUP, 30, 40);
-    Relay(WM_MOUSEMOVE, 31, 40);
-    FireParkTimer();
-    ASSERT_EQ(monitor.IsParked(), 1);
+    ASSERT_EQ(MoveAndFire(31, 40), 1);
     Relay(WM_LBUTTONDBLCLK, 31, 40, MK_LBUTTON);
     EXPECT_EQ(monitor.IsParked(), 0);
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 1) << "the double click left no button down";
+    EXPECT_EQ(MoveAndFire(30, 40), 1) << "the double click left no button down";
     Relay(WM_NCRBUTTONDOWN, 30, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
     EXPECT_EQ(Notifications(), (std::vector<WPARAM>{1, 0, 1, 0}));
@@ -129,43 +116,31 @@ TEST_F(ParkedCursorTest, DisablingStopsThePendingTimerAndKeepsARestUntilTheNextM
     Relay(WM_MOUSEMOVE, 30, 40);
     monitor.Enable(0);
     monitor.Enable(1);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
+    EXPECT_EQ(FireParkTimer(), 0);
 
-    Relay(WM_MOUSEMOVE, 31, 40);
-    FireParkTimer();
+    MoveAndFire(31, 40);
     monitor.Enable(0);
     EXPECT_EQ(monitor.IsEnabled(), 0);
     EXPECT_EQ(monitor.IsParked(), 1);
-    Relay(WM_MOUSEMOVE, 32, 40);
-    EXPECT_EQ(monitor.IsParked(), 0);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0) << "the move started no timer";
+    EXPECT_EQ(MoveAndFire(32, 40), 0) << "the move ended the rest and started no timer";
 
     // Enabling starts nothing until a move.
     monitor.Enable(1);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 1);
+    EXPECT_EQ(FireParkTimer(), 0);
+    EXPECT_EQ(MoveAndFire(30, 40), 1);
 }
 
 TEST_F(ParkedCursorTest, NoRestOverAnInactiveApplication)
 {
     TestWindow other(CRect(700, 600, 800, 700));   // activates itself
     ASSERT_EQ(::GetActiveWindow(), other.Handle());
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    EXPECT_EQ(monitor.IsParked(), 0);
+    EXPECT_EQ(MoveAndFire(30, 40), 0);
     EXPECT_TRUE(Notifications().empty());
 }
 
 TEST_F(ParkedCursorTest, RestEndsSilentlyOnceTheOwnerIsGone)
 {
-    Relay(WM_MOUSEMOVE, 30, 40);
-    FireParkTimer();
-    ASSERT_EQ(monitor.IsParked(), 1);
+    ASSERT_EQ(MoveAndFire(30, 40), 1);
     ::DestroyWindow(owner.Handle());   // takes the monitor's window with it
     EXPECT_EQ(monitor.GetSafeHwnd(), nullptr);
     Relay(WM_MOUSEMOVE, 31, 40);

@@ -42,14 +42,14 @@ void PumpPending()
     }
 }
 
-bool PumpUntil(const std::function<bool()>& done, DWORD timeoutMs)
+bool PumpUntil(const std::function<bool()>& done)
 {
     const DWORD start = ::GetTickCount();
     for (;;) {
         PumpPending();
         if (done())
             return true;
-        if (::GetTickCount() - start > timeoutMs)
+        if (::GetTickCount() - start > 3000)
             return false;
         ::MsgWaitForMultipleObjects(0, nullptr, FALSE, 10, QS_ALLINPUT);
     }
@@ -96,11 +96,6 @@ DWORD FreshTime()
     return now;
 }
 
-bool EnglishLocale()
-{
-    return (::GetUserDefaultLCID() & 0x3FF) == LANG_ENGLISH;
-}
-
 TestWindow::TestWindow(const CRect& rect, HWND parent)
 {
     const DWORD style = parent != nullptr ? WS_CHILD | WS_VISIBLE : WS_POPUP | WS_VISIBLE | WS_CLIPCHILDREN;
@@ -132,15 +127,6 @@ std::ostream& operator<<(std::ostream& out, const Call& call)
 {
     return out << call.name << "(button " << call.button << ", flags " << call.flags << ", (" << call.point.x
                << ", " << call.point.y << "), completed " << call.completed << ")";
-}
-
-std::vector<Call> RecordingScrollWnd::CallsNamed(const std::string& name) const
-{
-    std::vector<Call> result;
-    for (const Call& call : calls)
-        if (call.name == name)
-            result.push_back(call);
-    return result;
 }
 
 COLORREF PixelAt(HWND window, int x, int y)

@@ -1,13 +1,13 @@
-// Shared helpers of the scrolling-window tests: plain windows on the virtual
-// display, a scroll window that records its virtual operations, a message
-// pump bounded by a deadline, input with explicit message times, and pixel
-// read-back.
+// Shared helpers of the scrolling-window tests: plain windows, a scroll
+// window recording its virtual operations, a pump bounded by a deadline,
+// input with explicit message times, pixel read-back.
 #pragma once
 
 #include <afxwin.h>
 
 #include "Tavo_WiScrollWnd.h"
 
+#include <algorithm>
 #include <functional>
 #include <ostream>
 #include <string>
@@ -19,8 +19,8 @@ namespace ScrollTest {
 // Dispatches every pending message as the application's pump does. Real
 // WM_TIMER messages are dropped: the tests drive every timer by sending it.
 void PumpPending();
-// Pumps until done() holds or the deadline passes; returns done().
-bool PumpUntil(const std::function<bool()>& done, DWORD timeoutMs = 3000);
+// Pumps until done() holds or three seconds pass; returns done().
+bool PumpUntil(const std::function<bool()>& done);
 // Pumps until no input message is left in the queue.
 void PumpInput();
 
@@ -31,10 +31,6 @@ void SendKey(WORD virtualKey, DWORD time);
 // A base for explicit message times, at least two seconds after every base
 // handed out before, so that no two tests' clicks make a double click.
 DWORD FreshTime();
-
-// Whether the library uses its own window classes in this process (the
-// user's default locale is English).
-bool EnglishLocale();
 
 // A plain window attached to a CWnd for the framework's calls: a shown and
 // activated top-level window at a screen rectangle when parent is null, a
@@ -89,7 +85,10 @@ public:
     CString dataTipText;                                    // answered by GetDataTipText
     std::function<void(Tavo_WiScrollee*, CDC*)> painter;   // paints the view when set
 
-    std::vector<Call> CallsNamed(const std::string& name) const;
+    long Count(const std::string& name) const
+    {
+        return std::count_if(calls.begin(), calls.end(), [&](const Call& call) { return call.name == name; });
+    }
     void Clear() { calls.clear(); }
 
     void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override
@@ -110,7 +109,7 @@ public:
     void OnDragMove(UINT button, UINT flags, const CPoint& point) override { Record("DragMove", point, button, flags); }
     void OnDragEnd(UINT button, UINT flags, const CPoint& point, int completed) override
     {
-        Record("DragEnd", point, button, flags, completed);
+        calls.push_back({"DragEnd", button, flags, point, completed});
     }
     void OnDragAbort() override { Record("DragAbort", CPoint(0, 0)); }
     void OnParkedCursorStart(const CPoint& point) override
@@ -134,10 +133,9 @@ public:
     void OnNonDragScrollEnd(const CPoint& position) override { Record("NonDragScrollEnd", position); }
 
 private:
-    void Record(const char* name, const CPoint& point, UINT button = 0, UINT flags = 0,
-                int completed = -1)
+    void Record(const char* name, const CPoint& point, UINT button = 0, UINT flags = 0)
     {
-        calls.push_back({name, button, flags, point, completed});
+        calls.push_back({name, button, flags, point});
     }
 };
 
@@ -150,12 +148,8 @@ CRect ChildRect(HWND child);
 }  // namespace ScrollTest
 
 // Readable values in test failures.
-inline void PrintTo(const CRect& rect, std::ostream* out)
+inline void PrintTo(const CRect& r, std::ostream* out)
 {
-    *out << "(" << rect.left << ", " << rect.top << ", " << rect.right << ", " << rect.bottom << ")";
+    *out << "(" << r.left << ", " << r.top << ", " << r.right << ", " << r.bottom << ")";
 }
-
-inline void PrintTo(const CPoint& point, std::ostream* out)
-{
-    *out << "(" << point.x << ", " << point.y << ")";
-}
+inline void PrintTo(const CPoint& p, std::ostream* out) { *out << "(" << p.x << ", " << p.y << ")"; }

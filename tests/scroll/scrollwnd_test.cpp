@@ -29,6 +29,17 @@ SCROLLINFO BarInfo(HWND bar)
     return info;
 }
 
+// Range 0..1000 on both axes, a window of 100 x 100, lines of 10, pages of 50.
+void SetSquareModel(RecordingScrollWnd& wnd, const CPoint& position)
+{
+    wnd.SetScrollRange(0, 1000, 0, 1000);
+    wnd.SetScrollDeltas(CSize(50, 50), CSize(10, 10));
+    wnd.SetScrollWindowExtent(100, 100);
+    wnd.SetScrollPosition(position);
+    wnd.SetScrollDone();
+    wnd.Clear();
+}
+
 class ScrollWndTest : public ::testing::Test
 {
 protected:
@@ -48,17 +59,6 @@ protected:
     HWND VertBar() { return ::GetDlgItem(wnd.GetSafeHwnd(), Tavo_WiScrollWnd::VertBarId); }
     HWND Corner() { return ::GetDlgItem(wnd.GetSafeHwnd(), Tavo_WiScrollWnd::CornerId); }
     HWND Scrollee() { return wnd.GetScrollee()->GetSafeHwnd(); }
-
-    // Range 0..1000 on both axes, a window of 100 x 100, lines of 10, pages of 50.
-    void SetSquareModel(const CPoint& position)
-    {
-        wnd.SetScrollRange(0, 1000, 0, 1000);
-        wnd.SetScrollDeltas(CSize(50, 50), CSize(10, 10));
-        wnd.SetScrollWindowExtent(100, 100);
-        wnd.SetScrollPosition(position);
-        wnd.SetScrollDone();
-        wnd.Clear();
-    }
 
     // A WM_HSCROLL or WM_VSCROLL from the matching bar.
     void SendScroll(UINT message, UINT code, int n = 0)
@@ -123,11 +123,9 @@ TEST_F(ScrollWndTest, ThumbPositionsMapBackFromBarUnitsBeyondSixteenBits)
     wnd.SetScrollWindowExtent(200, 10);
     wnd.SetScrollPosition(CPoint(1000, 7));
     const SCROLLINFO h = BarInfo(HorzBar());
-    const SCROLLINFO v = BarInfo(VertBar());
     EXPECT_EQ(h.nPage, 100u);
     EXPECT_EQ(h.nPos, 500);
-    EXPECT_EQ(v.nPage, 10u);
-    EXPECT_EQ(v.nPos, 7);
+    EXPECT_EQ(BarInfo(VertBar()).nPos, 7);
     SendScroll(WM_HSCROLL, SB_THUMBTRACK, 1234);
     EXPECT_EQ(wnd.GetScrollPosition().x, 2468);
     SendScroll(WM_HSCROLL, SB_ENDSCROLL);
@@ -157,11 +155,7 @@ TEST_F(ScrollWndTest, WindowLargerThanTheRangeEndsBeforeTheMinimumOrInvertedAtTh
 TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
 {
     RecordingScrollWnd unborn;
-    unborn.SetScrollRange(0, 1000, 0, 1000);
-    unborn.SetScrollDeltas(CSize(50, 50), CSize(10, 10));
-    unborn.SetScrollWindowExtent(100, 100);
-    unborn.SetScrollPosition(CPoint(2000, -5));
-    unborn.SetScrollDone();
+    SetSquareModel(unborn, CPoint(2000, -5));
     EXPECT_EQ(unborn.GetScrollPosition(), CPoint(900, 0));
     // Unknown directions and amounts do nothing at all.
     unborn.ScrollWindow(static_cast<Tavo_WiScroll::Dir>(4), Tavo_WiScroll::Line, 0);
@@ -179,37 +173,31 @@ TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
 
 TEST_F(ScrollWndTest, EveryScrollCodeMovesToItsTargetAndTheBarShowsIt)
 {
-    constexpr UINT H = WM_HSCROLL;
-    constexpr UINT V = WM_VSCROLL;
-    const struct { UINT message; int inverted; UINT code; int n; int expected; } cases[] = {
-        // 100 and 101 step back and forward by n percent of the window extent.
-        {H, 0, SB_LINELEFT, 0, 490},   {H, 0, SB_LINERIGHT, 0, 510},     {H, 0, SB_PAGELEFT, 0, 450},
-        {H, 0, SB_PAGERIGHT, 0, 550},  {H, 0, SB_THUMBTRACK, 200, 200},  {H, 0, SB_THUMBPOSITION, 321, 321},
-        {H, 0, SB_LEFT, 0, 0},         {H, 0, SB_RIGHT, 0, 900},         {H, 0, 100, 25, 475},
-        {H, 0, 101, 25, 525},          {H, 0, 42, 0, 500},
-        {V, 0, SB_LINEUP, 0, 490},     {V, 0, SB_LINEDOWN, 0, 510},      {V, 0, SB_PAGEUP, 0, 450},
-        {V, 0, SB_PAGEDOWN, 0, 550},   {V, 0, SB_THUMBTRACK, 200, 200},  {V, 0, SB_TOP, 0, 0},
-        {V, 0, SB_BOTTOM, 0, 900},     {V, 0, 100, 25, 475},             {V, 0, 101, 25, 525},
-        {V, 0, 42, 0, 500},
-        // Inverted: y grows upwards, so up is towards the maximum.
-        {V, 1, SB_LINEUP, 0, 510},     {V, 1, SB_LINEDOWN, 0, 490},      {V, 1, SB_PAGEUP, 0, 550},
-        {V, 1, SB_PAGEDOWN, 0, 450},   {V, 1, SB_THUMBTRACK, 200, 800},  {V, 1, SB_TOP, 0, 1000},
-        {V, 1, SB_BOTTOM, 0, 100},     {V, 1, 100, 25, 525},             {V, 1, 101, 25, 475},
-        {V, 1, 42, 0, 500},
+    // From (500, 500): the target normally and with y inverted (y grows
+    // upwards, so up is towards the maximum; the flag leaves x alone). 100
+    // and 101 step back and forward by n percent of the window extent.
+    const struct { UINT code; int n; int normal, invertedY; } cases[] = {
+        {SB_LINEUP, 0, 490, 510},        {SB_LINEDOWN, 0, 510, 490},          {SB_PAGEUP, 0, 450, 550},
+        {SB_PAGEDOWN, 0, 550, 450},      {SB_THUMBTRACK, 200, 200, 800},      {SB_THUMBPOSITION, 321, 321, 679},
+        {SB_TOP, 0, 0, 1000},            {SB_BOTTOM, 0, 900, 100},            {100, 25, 475, 525},
+        {101, 25, 525, 475},             {42, 0, 500, 500},
     };
-    for (const auto& c : cases) {
-        const bool horizontal = c.message == H;
-        SCOPED_TRACE(testing::Message() << (horizontal ? "H" : "V") << " inverted " << c.inverted << " code "
-                                        << c.code);
-        wnd.SetScrollInvertedY(c.inverted);
-        SetSquareModel(CPoint(500, 500));
-        SendScroll(c.message, c.code, c.n);
-        EXPECT_EQ(wnd.GetScrollPosition(), horizontal ? CPoint(c.expected, 500) : CPoint(500, c.expected));
-        // An inverted bar shows the distance from the top of the range.
-        const int barPosition = !horizontal && c.inverted ? 1000 - c.expected : c.expected;
-        EXPECT_EQ(BarInfo(horizontal ? HorzBar() : VertBar()).nPos, barPosition);
-        SendScroll(c.message, SB_ENDSCROLL);
-    }
+    for (UINT message : {WM_HSCROLL, WM_VSCROLL})
+        for (int inverted : {0, 1})
+            for (const auto& c : cases) {
+                const bool horizontal = message == WM_HSCROLL;
+                SCOPED_TRACE(testing::Message() << (horizontal ? "H" : "V") << " inverted " << inverted << " code "
+                                                << c.code);
+                wnd.SetScrollInvertedY(inverted);
+                SetSquareModel(wnd, CPoint(500, 500));
+                SendScroll(message, c.code, c.n);
+                const int expected = !horizontal && inverted ? c.invertedY : c.normal;
+                EXPECT_EQ(wnd.GetScrollPosition(), horizontal ? CPoint(expected, 500) : CPoint(500, expected));
+                // An inverted bar shows the distance from the top of the range.
+                const int barPosition = !horizontal && inverted ? 1000 - expected : expected;
+                EXPECT_EQ(BarInfo(horizontal ? HorzBar() : VertBar()).nPos, barPosition);
+                SendScroll(message, SB_ENDSCROLL);
+            }
 }
 
 TEST_F(ScrollWndTest, DraggingTheRealThumbOfAFarRangeScrolls)
@@ -221,7 +209,6 @@ TEST_F(ScrollWndTest, DraggingTheRealThumbOfAFarRangeScrolls)
     wnd.SetScrollDone();
     ASSERT_TRUE(::IsWindowVisible(HorzBar()));
     wnd.Clear();
-
     SCROLLBARINFO bar = {};
     bar.cbSize = sizeof bar;
     ASSERT_TRUE(::GetScrollBarInfo(HorzBar(), OBJID_CLIENT, &bar));
@@ -234,10 +221,10 @@ TEST_F(ScrollWndTest, DraggingTheRealThumbOfAFarRangeScrolls)
     SendMouse(MOUSEEVENTF_LEFTDOWN, thumb, time + 10);
     SendMouse(0, dragged, time + 20);
     SendMouse(MOUSEEVENTF_LEFTUP, dragged, time + 30);
-    PumpUntil([this] { return !wnd.CallsNamed("DragScrollEnd").empty(); });
+    PumpUntil([this] { return wnd.Count("DragScrollEnd") != 0; });
 
-    ASSERT_EQ(wnd.CallsNamed("DragScrollStart").size(), 1u);
-    ASSERT_EQ(wnd.CallsNamed("DragScrollEnd").size(), 1u);
+    ASSERT_EQ(wnd.Count("DragScrollStart"), 1);
+    ASSERT_EQ(wnd.Count("DragScrollEnd"), 1);
     const int x = wnd.GetScrollPosition().x;
     EXPECT_GT(x, 201000) << "the thumb moved a good part of the range";
     EXPECT_LE(x, 230000 - 3000);
@@ -253,18 +240,14 @@ TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
     wnd.SetScrollRange(0, 10000, 0, 10000);
     wnd.SetScrollWindowExtent(101, 101);
     wnd.SetScrollPosition(CPoint(1000, 5000));
-    wnd.ScrollWindow(Up, Tavo_WiScroll::Percent, 50);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5051));
-    wnd.ScrollWindow(Right, Tavo_WiScroll::Percent, 50);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1050, 5051));
-    wnd.ScrollWindow(Down, Tavo_WiScroll::Percent, 50);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1050, 5000));
-    wnd.ScrollWindow(Left, Tavo_WiScroll::Percent, 50);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5000));
     // A negative percentage scrolls nothing.
-    wnd.ScrollWindow(Right, Tavo_WiScroll::Percent, -30);
-    wnd.ScrollWindow(Down, Tavo_WiScroll::Percent, -30);
-    EXPECT_EQ(wnd.GetScrollPosition(), CPoint(1000, 5000));
+    const struct { Tavo_WiScroll::Dir dir; int n; CPoint expected; } steps[] = {
+        {Up, 50, {1000, 5051}}, {Right, 50, {1050, 5051}}, {Down, 50, {1050, 5000}},
+        {Left, 50, {1000, 5000}}, {Right, -30, {1000, 5000}}, {Down, -30, {1000, 5000}}};
+    for (const auto& step : steps) {
+        wnd.ScrollWindow(step.dir, Tavo_WiScroll::Percent, step.n);
+        EXPECT_EQ(wnd.GetScrollPosition(), step.expected) << step.dir << " " << step.n;
+    }
     // The step of a huge extent does not wrap.
     wnd.SetScrollRange(0, 2000000000, 0, 10000);
     wnd.SetScrollWindowExtent(50000000, 10);
@@ -277,7 +260,7 @@ TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
 
 TEST_F(ScrollWndTest, ScrollWindowTestChangesNeitherPositionNorBarsNorPixels)
 {
-    SetSquareModel(CPoint(900, 500));
+    SetSquareModel(wnd, CPoint(900, 500));
     ::UpdateWindow(Scrollee());
     const int barPosition = BarInfo(HorzBar()).nPos;
     EXPECT_FALSE(wnd.ScrollWindowTest(Right, Tavo_WiScroll::Line, 0)) << "clamped back at the right end";
@@ -288,18 +271,18 @@ TEST_F(ScrollWndTest, ScrollWindowTestChangesNeitherPositionNorBarsNorPixels)
     EXPECT_FALSE(::GetUpdateRect(Scrollee(), nullptr, FALSE)) << "nothing was invalidated";
     // Each test ends like a ScrollWindow call, with the unchanged position,
     // and moves no pixels.
-    const Call end{"NonDragScrollEnd", 0, 0, {900, 500}, -1};
+    const Call end{"NonDragScrollEnd", 0, 0, {900, 500}};
     EXPECT_EQ(wnd.calls, (std::vector<Call>{end, end, end}));
 
     // A limit towards the edge already reached moves nothing but still ends.
-    SetSquareModel(CPoint(0, 500));
+    SetSquareModel(wnd, CPoint(0, 500));
     wnd.ScrollWindow(Left, Tavo_WiScroll::Limit, 0);
-    EXPECT_EQ(wnd.calls, (std::vector<Call>{{"NonDragScrollEnd", 0, 0, {0, 500}, -1}}));
+    EXPECT_EQ(wnd.calls, (std::vector<Call>{{"NonDragScrollEnd", 0, 0, {0, 500}}}));
 }
 
 TEST_F(ScrollWndTest, ThumbCodesDragScrollAndTheEndCodeEndsWhicheverScrollRan)
 {
-    SetSquareModel(CPoint(500, 500));
+    SetSquareModel(wnd, CPoint(500, 500));
     SendScroll(WM_HSCROLL, SB_THUMBTRACK, 300);
     SendScroll(WM_HSCROLL, SB_THUMBTRACK, 310);
     SendScroll(WM_HSCROLL, SB_THUMBPOSITION, 310);
@@ -310,11 +293,9 @@ TEST_F(ScrollWndTest, ThumbCodesDragScrollAndTheEndCodeEndsWhicheverScrollRan)
     SendScroll(WM_VSCROLL, SB_ENDSCROLL);
 
     const std::vector<Call> expected = {
-        {"DragScrollStart", 0, 0, {500, 500}, -1}, {"ScrollDeltas", 0, 0, {300, 500}, -1},
-        {"DragScrollMove", 0, 0, {300, 500}, -1},  {"ScrollDeltas", 0, 0, {310, 500}, -1},
-        {"DragScrollMove", 0, 0, {310, 500}, -1},  {"DragScrollEnd", 0, 0, {310, 500}, -1},
-        {"ScrollDeltas", 0, 0, {310, 510}, -1},    {"NonDragScrollEnd", 0, 0, {310, 510}, -1},
-    };
+        {"DragScrollStart", 0, 0, {500, 500}}, {"ScrollDeltas", 0, 0, {300, 500}}, {"DragScrollMove", 0, 0, {300, 500}},
+        {"ScrollDeltas", 0, 0, {310, 500}},    {"DragScrollMove", 0, 0, {310, 500}}, {"DragScrollEnd", 0, 0, {310, 500}},
+        {"ScrollDeltas", 0, 0, {310, 510}},    {"NonDragScrollEnd", 0, 0, {310, 510}}};
     EXPECT_EQ(wnd.calls, expected);
 }
 
@@ -382,7 +363,6 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
         for (int x = step.firstKept; x < step.lastKept; ++x)
             ASSERT_EQ(PixelAt(Scrollee(), x, 150), StripeColour(x + step.x)) << "column " << x;
     }
-
 }
 
 // ---- destruction ------------------------------------------------------------------------------
