@@ -12,16 +12,18 @@ constexpr COLORREF kRed = RGB(255, 0, 0);
 
 // A memory DC with a white bitmap selected, for reading pixels back.
 struct PixelSurface {
-  PixelSurface() { ::PatBlt(dc, 0, 0, kBitmapSize, kBitmapSize, WHITENESS); }
+  PixelSurface()
+  {
+    ::SelectObject(dc, bitmap);
+    ::PatBlt(dc, 0, 0, kBitmapSize, kBitmapSize, WHITENESS);
+  }
   ~PixelSurface()
   {
-    ::SelectObject(dc, previous);
+    ::DeleteDC(dc);  // lets go of the bitmap, which can then be deleted
     ::DeleteObject(bitmap);
-    ::DeleteDC(dc);
   }
   HDC dc = ::CreateCompatibleDC(NULL);
   HBITMAP bitmap = ::CreateBitmap(kBitmapSize, kBitmapSize, 1, 32, NULL);
-  HGDIOBJ previous = ::SelectObject(dc, bitmap);
 };
 
 class CPaintRecorderWnd : public CWnd {

@@ -133,10 +133,7 @@ TEST_F(MessageMapTest, CreateHooksObjectsBeforeFirstMessageEvenWhenNested)
   EXPECT_EQ(&wnd, CWnd::FromHandlePermanent(wnd.m_hWnd));
   EXPECT_EQ(reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc()), ::GetWindowLongPtrA(wnd.m_hWnd, GWLP_WNDPROC));
   EXPECT_EQ(1, wnd.m_inner.m_createCount);
-  EXPECT_EQ(&wnd.m_inner, CWnd::FromHandlePermanent(wnd.m_inner.m_hWnd));
-  EXPECT_NE(0u, wnd.m_inner.GetStyle() & WS_CHILD);
-  EXPECT_EQ(&wnd, wnd.m_inner.GetParent());
-  EXPECT_EQ(&wnd.m_inner, wnd.GetDlgItem(9));
+  EXPECT_EQ(&wnd.m_inner, wnd.GetDlgItem(9));  // a child of the outer window, mapped to its object
 }
 
 TEST_F(MessageMapTest, FailedCreateLeavesObjectUnattached)
@@ -168,10 +165,6 @@ TEST_F(MessageMapTest, BaseClassEntriesDispatchAndContainExceptions)
   EXPECT_EQ(0, wnd.SendMessage(kDerivedOnlyMessage));  // a derived class's entry is not the base's
   wnd.SendMessage(WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(static_cast<WORD>(-3), 5));
   EXPECT_EQ(CPoint(-3, 5), wnd.m_lastPoint);
-  wnd.SetWindowText("changed by default processing");  // unmapped: DefWindowProc keeps the text
-  CString text;
-  wnd.GetWindowText(text);
-  EXPECT_STREQ("changed by default processing", static_cast<LPCSTR>(text));
   wnd.m_throwOnAppMessage = true;  // the exception ends at the framework's window procedure
   EXPECT_EQ(0, wnd.SendMessage(kAppMessage));
   EXPECT_TRUE(::IsWindow(wnd.m_hWnd));
@@ -229,11 +222,10 @@ TEST_F(MessageMapTest, RegisterClassAcceptsRepeatsAndRefusesIncompleteDescriptio
   EXPECT_EQ(1, wnd.m_createCount);
 
   EXPECT_FALSE(AfxRegisterClass(NULL));
-  WNDCLASSA unnamed = wc;
-  unnamed.lpszClassName = NULL;
-  EXPECT_FALSE(AfxRegisterClass(&unnamed));
-  WNDCLASSA noProcedure = wc;
-  noProcedure.lpfnWndProc = NULL;
-  noProcedure.lpszClassName = "TavoAfxTestClassWithoutProcedure";
-  EXPECT_FALSE(AfxRegisterClass(&noProcedure));
+  WNDCLASSA incomplete = wc;
+  incomplete.lpszClassName = NULL;
+  EXPECT_FALSE(AfxRegisterClass(&incomplete));
+  incomplete.lpszClassName = "TavoAfxTestClassWithoutProcedure";
+  incomplete.lpfnWndProc = NULL;
+  EXPECT_FALSE(AfxRegisterClass(&incomplete));
 }

@@ -82,20 +82,7 @@ TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
   }
 }
 
-TEST_F(PrintTest, PrintInfoStartsWithFrameworkDialogFlagsAndFullPageRange)
-{
-  CPrintInfo info;
-  ASSERT_NE(nullptr, info.m_pPD);
-  const DWORD flags = info.m_pPD->m_pd.Flags;
-  EXPECT_EQ(static_cast<DWORD>(PD_USEDEVMODECOPIES | PD_NOSELECTION | PD_RETURNDC),
-            flags & static_cast<DWORD>(PD_USEDEVMODECOPIES | PD_NOSELECTION | PD_RETURNDC | PD_PRINTSETUP));
-  EXPECT_EQ(1u, info.GetMinPage());
-  EXPECT_EQ(0xFFFFu, info.GetMaxPage());
-  EXPECT_EQ(1u, info.GetFromPage());
-  EXPECT_EQ(0xFFFFu, info.GetToPage());
-}
-
-TEST_F(PrintTest, PrintInfoOwnsTheDialogPutInIt)
+TEST_F(PrintTest, PrintInfoMakesItsDialogWithFrameworkFlagsAndFullPageRangeAndOwnsIt)
 {
   struct CCountedDialog : CPrintDialog {
     explicit CCountedDialog(int& destroyed) : CPrintDialog(FALSE), m_destroyed(destroyed) {}
@@ -105,6 +92,14 @@ TEST_F(PrintTest, PrintInfoOwnsTheDialogPutInIt)
   int destroyed = 0;
   {
     CPrintInfo info;
+    ASSERT_NE(nullptr, info.m_pPD);
+    const DWORD flags = info.m_pPD->m_pd.Flags;
+    EXPECT_EQ(static_cast<DWORD>(PD_USEDEVMODECOPIES | PD_NOSELECTION | PD_RETURNDC),
+              flags & static_cast<DWORD>(PD_USEDEVMODECOPIES | PD_NOSELECTION | PD_RETURNDC | PD_PRINTSETUP));
+    EXPECT_EQ(1u, info.GetMinPage());
+    EXPECT_EQ(0xFFFFu, info.GetMaxPage());
+    EXPECT_EQ(1u, info.GetFromPage());
+    EXPECT_EQ(0xFFFFu, info.GetToPage());
     delete info.m_pPD;
     info.m_pPD = new CCountedDialog(destroyed);
   }
