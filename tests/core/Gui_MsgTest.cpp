@@ -9,10 +9,7 @@
 
 namespace {
 
-HINSTANCE ThisProgram()
-{
-    return GetModuleHandleA(nullptr);
-}
+const HINSTANCE kThisProgram = GetModuleHandleA(nullptr);
 
 std::string Text(const CString& value)
 {
@@ -21,9 +18,9 @@ std::string Text(const CString& value)
 
 TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimalAndOtherPercentSignsStay)
 {
-    EXPECT_EQ(Text((Gui_Msg(100, ThisProgram()) << 3 << -12).GetValue()), "Value 3 of -12");
-    EXPECT_EQ(Text((Gui_Msg(101, ThisProgram()) << 7).GetValue()), "100% sure, %3 stays, 77");
-    Gui_Msg twoDigits(102, ThisProgram());
+    EXPECT_EQ(Text((Gui_Msg(100, kThisProgram) << 3 << -12).GetValue()), "Value 3 of -12");
+    EXPECT_EQ(Text((Gui_Msg(101, kThisProgram) << 7).GetValue()), "100% sure, %3 stays, 77");
+    Gui_Msg twoDigits(102, kThisProgram);
     for (int i = 1; i <= 12; ++i)
         twoDigits << i * 10;
     EXPECT_EQ(Text(twoDigits.GetValue()), "120 and 10");
@@ -40,28 +37,27 @@ TEST(MessageText, ArgumentTextIsNeverFormattedAgain)
 TEST(MessageText, StringsOfLaterBlocksAreFoundAndAMissingStringGivesTheEmptyText)
 {
     std::string text;
-    ASSERT_TRUE(Gui_Msg::LoadText(117, ThisProgram(), text));
+    ASSERT_TRUE(Gui_Msg::LoadText(117, kThisProgram, text));
     EXPECT_EQ(text, "block two");
-    EXPECT_FALSE(Gui_Msg::LoadText(103, ThisProgram(), text));
+    EXPECT_FALSE(Gui_Msg::LoadText(103, kThisProgram, text));
     EXPECT_FALSE(Gui_Msg::LoadText(100, nullptr, text)) << "nothing registered yet";
-    EXPECT_TRUE(Gui_Msg(4000, ThisProgram()).GetValue().IsEmpty());
+    EXPECT_TRUE(Gui_Msg(4000, kThisProgram).GetValue().IsEmpty());
 }
 
 TEST(MessageLookup, RegisteredModulesAreSearchedWhenNoModuleIsGiven)
 {
     AFX_EXTENSION_MODULE record = {};
     const int before = Gui_Locale::GetResourceModuleCount();
-    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), nullptr);
-    Gui_Locale::SetDllResourceHandle(record, ThisProgram(), nullptr);
+    Gui_Locale::SetDllResourceHandle(record, kThisProgram, nullptr);
+    Gui_Locale::SetDllResourceHandle(record, kThisProgram, nullptr);
     EXPECT_EQ(Gui_Locale::GetResourceModuleCount(), before + 1) << "a module is listed once";
-    EXPECT_EQ(Gui_Locale::GetResourceModule(before), ThisProgram());
-    EXPECT_EQ(record.hResource, ThisProgram());
+    EXPECT_TRUE(Gui_Locale::GetResourceModule(before) == kThisProgram && record.hResource == kThisProgram);
     EXPECT_EQ(Text((Gui_Msg(100) << 1 << 2).GetValue()), "Value 1 of 2");
     EXPECT_EQ(Gui_Locale::GetResourceModule(-1), nullptr);
 
     AFX_EXTENSION_MODULE other = {};
-    Gui_Locale::SetDllResourceHandle(other, ThisProgram(), "no-such-library.dll");
-    EXPECT_EQ(other.hResource, ThisProgram()) << "a resource library that cannot be loaded falls back to the instance";
+    Gui_Locale::SetDllResourceHandle(other, kThisProgram, "no-such-library.dll");
+    EXPECT_EQ(other.hResource, kThisProgram) << "a resource library that cannot be loaded falls back to the instance";
 }
 
 } // namespace

@@ -42,23 +42,14 @@ public:
     void DrawCircle(Tavo_GrDPoint& centre, int radius, Tavo_GrAttr* attr) override { Item(attr, "Circle", {centre}, radius); }
     void DrawDot(Tavo_GrDPoint& point, Tavo_GrAttr* attr) override { Item(attr, "Dot", {point}); }
     void DrawLine(Tavo_GrDPoint& from, Tavo_GrDPoint& to, Tavo_GrAttr* attr) override { Item(attr, "Line", {from, to}); }
-    void DrawPline(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr) override
-    {
-        Item(attr, "Pline", std::vector<Tavo_GrDPoint>(points, points + count));
-    }
-    void DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr) override
-    {
-        Item(attr, "Rect", {{rect.xmin, rect.ymin}, {rect.xmax, rect.ymax}});
-    }
+    void DrawPline(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr) override { Item(attr, "Pline", {points, points + count}); }
+    void DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr) override { Item(attr, "Rect", Corners(rect)); }
     void DrawText(const char* text, Tavo_GrDRect& box, Tavo_GrAttr* attr, unsigned int fontHeight) override
     {
-        Item(attr, "TextBox", {{box.xmin, box.ymin}, {box.xmax, box.ymax}}, static_cast<int>(fontHeight), text);
+        Item(attr, "TextBox", Corners(box), static_cast<int>(fontHeight), text);
     }
     void DrawText(const char* text, Tavo_GrDPoint& point, Tavo_GrAttr* attr) override { Item(attr, "Text", {point}, 0, text); }
-    void DrawTriangle(Tavo_GrDPoint points[3], Tavo_GrAttr* attr) override
-    {
-        Item(attr, "Triangle", {points[0], points[1], points[2]});
-    }
+    void DrawTriangle(Tavo_GrDPoint p[3], Tavo_GrAttr* attr) override { Item(attr, "Triangle", {p[0], p[1], p[2]}); }
 
     void Flush() override { Tavo_GrSurface::Flush(); Note("Flush"); }
     void OnAttrChange() override { Tavo_GrSurface::OnAttrChange(); ++m_attrChanges; }
@@ -76,24 +67,17 @@ public:
 private:
     int m_polls = 0;
 
-    void Note(const char* op)
+    static std::vector<Tavo_GrDPoint> Corners(const Tavo_GrDRect& r) { return {{r.xmin, r.ymin}, {r.xmax, r.ymax}}; }
+    void Note(const char* op, std::vector<Tavo_GrDPoint> points = {}, int number = 0, const char* text = "")
     {
-        m_calls.emplace_back();
-        m_calls.back().op = op;
+        m_calls.push_back({op, std::move(points), number, text ? text : "", GetCurrentColor(), IsHollow(), GetScale(),
+                           GetDeviceHeight()});
     }
     void Item(Tavo_GrAttr* attr, const char* op, std::vector<Tavo_GrDPoint> points, int number = 0, const char* text = "")
     {
         SetCurrentAttr(attr);
         ++m_items;
-        Note(op);
-        Call& call = m_calls.back();
-        call.points = std::move(points);
-        call.number = number;
-        call.text = text ? text : "";
-        call.color = GetCurrentColor();
-        call.hollow = IsHollow();
-        call.scale = GetScale();
-        call.deviceHeight = GetDeviceHeight();
+        Note(op, std::move(points), number, text);
         if (m_items == m_interruptAfterItem)
             SetDrawingInterruptedFlag();
     }

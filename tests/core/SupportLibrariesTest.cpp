@@ -10,6 +10,7 @@
 
 #include <climits>
 #include <cstdlib>
+#include <memory>
 #include <string>
 
 namespace {
@@ -20,13 +21,11 @@ TEST(DynamicArray, GettingTheAddressAtTheCountAppendsAZeroedElementAndNothingEls
 {
     void** elements = nullptr;
     UT_DARRAY array(&elements, sizeof(void*), 20, 1);
-    EXPECT_EQ(array.getaddr(-1), nullptr);
-    EXPECT_EQ(array.getaddr(1), nullptr);
+    EXPECT_TRUE(array.getaddr(-1) == nullptr && array.getaddr(1) == nullptr);
     void* slot = array.getaddr(0);
     ASSERT_NE(slot, nullptr);
     EXPECT_EQ(array.getnum(), 1);
-    EXPECT_EQ(*static_cast<void**>(slot), nullptr);
-    EXPECT_EQ(slot, &elements[0]) << "the owner's pointer follows the storage";
+    EXPECT_TRUE(slot == &elements[0] && elements[0] == nullptr) << "zeroed, and the owner's pointer follows the storage";
 }
 
 TEST(DynamicArray, ElementsKeepTheirValuesWhenTheStorageGrowsOrTheCountIsReset)
@@ -39,14 +38,10 @@ TEST(DynamicArray, ElementsKeepTheirValuesWhenTheStorageGrowsOrTheCountIsReset)
         ASSERT_EQ(array.getnum(), 1000);
         for (int i = 0; i < 1000; ++i)
             ASSERT_EQ(elements[i], i * 3 + 1);
-        EXPECT_TRUE(array.a_resetnum(1));
-        EXPECT_EQ(array.getnum(), 1);
+        EXPECT_TRUE(array.a_resetnum(1) && array.getnum() == 1);
         EXPECT_TRUE(array.a_resetnum(5));
-        EXPECT_EQ(elements[0], 1);
-        EXPECT_EQ(elements[1], 0) << "new elements start zeroed";
-        EXPECT_EQ(elements[4], 0);
-        EXPECT_TRUE(array.a_resetnum(-3));
-        EXPECT_EQ(array.getnum(), 0);
+        EXPECT_TRUE(elements[0] == 1 && elements[1] == 0 && elements[4] == 0) << "new elements start zeroed";
+        EXPECT_TRUE(array.a_resetnum(-3) && array.getnum() == 0);
     }
     EXPECT_EQ(elements, nullptr) << "destruction clears the owner's pointer";
 }
@@ -56,11 +51,9 @@ TEST(DynamicArray, ElementsKeepTheirValuesWhenTheStorageGrowsOrTheCountIsReset)
 TEST(Strings, DupMakesAnIndependentCopy)
 {
     const char original[] = "gray";
-    char* copy = UT_STR::Dup(original);
-    ASSERT_NE(copy, nullptr);
-    EXPECT_NE(copy, original);
-    EXPECT_STREQ(copy, "gray");
-    delete[] copy;
+    const std::unique_ptr<char[]> copy(UT_STR::Dup(original));
+    EXPECT_NE(copy.get(), original);
+    EXPECT_STREQ(copy.get(), "gray");
     EXPECT_EQ(UT_STR::Dup(nullptr), nullptr);
 }
 
