@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <iterator>
 #include <numeric>
+#include <utility>
 
 GdiCallRecorder* GdiCallRecorder::s_current = nullptr;
 
@@ -101,10 +102,7 @@ COLORREF WINAPI RecordSetTextColor(HDC dc, COLORREF colour)
 #define TAVO_RECORD(function) {#function, reinterpret_cast<void*>(&Record##function)}
 
 // In the order of GdiCall::Kind.
-const struct {
-    const char* function;
-    void* replacement;
-} kReplacements[] = {
+const std::pair<const char*, void*> kReplacements[] = {
     TAVO_RECORD(PolyPolyline), TAVO_RECORD(Polygon),
     {"Rectangle", reinterpret_cast<void*>(&RecordBox<GdiCall::Rectangle>)},
     {"Ellipse", reinterpret_cast<void*>(&RecordBox<GdiCall::Ellipse>)},
@@ -121,7 +119,7 @@ GdiCallRecorder::GdiCallRecorder()
     s_current = this;
     const HMODULE module = GetModuleHandleA("libTavo_Windows.dll");
     for (const auto& entry : kReplacements)
-        m_redirects.push_back(std::make_unique<ImportPatch>(module, entry.function, entry.replacement));
+        m_redirects.push_back(std::make_unique<ImportPatch>(module, entry.first, entry.second));
 }
 
 GdiCallRecorder::~GdiCallRecorder()

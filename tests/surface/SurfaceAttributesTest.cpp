@@ -67,7 +67,7 @@ TEST_F(SurfaceTest, AttributeChangeRebuildsOnlyWhatChangedAndFlushesOnlyOnColour
         {"height", Outline(kRed, 20), {0, 0, 1, 1, 0, 1, 0, 0}, 1},
         {"alignment", Outline(kRed, 10, Tavo_GrAttr::AlignCentre | Tavo_GrAttr::AlignTop), {0, 0, 0, 0, 1, 1, 0, 0}, 1},
     };
-    Tavo_GrDPoint a = At(5, 5), b = At(50, 5);
+    Tavo_GrDPoint a{5, 5}, b{50, 5};
     for (auto c : cases) {
         SCOPED_TRACE(c.change);
         CreateSurface();
@@ -101,11 +101,10 @@ TEST_F(SurfaceTest, FontHeightIsScaledRoundedAndKeptAtTheMinimum)
         {nullptr, 0.5, 21, {11}},   {nullptr, 1.0, -40, {}},  {nullptr, 1.0e12, 1000, {INT_MAX}},
     };
     for (const auto& c : cases) {
-        SCOPED_TRACE(testing::Message() << (c.minFont ? c.minFont : "unset") << ", " << c.charHeight << " at "
-                                        << c.scale);
+        SCOPED_TRACE(testing::Message() << "minimum " << (c.minFont ? c.minFont : "unset") << ", " << c.charHeight);
         CreateSurface("BRY_VWR_MINFONT", c.minFont, c.scale);
         Tavo_GrAttr attr = Outline(kBlack, c.charHeight);
-        Tavo_GrDPoint p = At(10, 40);
+        Tavo_GrDPoint p{10, 40};
         m_surface->DrawText("x", p, &attr);
         std::vector<int> fonts;
         for (const GdiCall& font : m_recorder.Of(GdiCall::CreateFont))

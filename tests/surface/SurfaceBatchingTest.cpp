@@ -30,9 +30,9 @@ protected:
     }
 
     Tavo_GrAttr m_attr;
-    Tavo_GrDPoint m_dot = At(5, 150), m_lineEnd = At(50, 140), m_centre = At(60, 60);
-    Tavo_GrDPoint m_tiny[3] = {At(10, 10), At(12, 12), At(8, 12)};
-    Tavo_GrDPoint m_big[3] = {At(10, 10), At(40, 10), At(20, 40)};
+    Tavo_GrDPoint m_dot{5, 150}, m_lineEnd{50, 140}, m_centre{60, 60};
+    Tavo_GrDPoint m_tiny[3] = {{10, 10}, {12, 12}, {8, 12}};
+    Tavo_GrDPoint m_big[3] = {{10, 10}, {40, 10}, {20, 40}};
     Tavo_GrDRect m_rect{10, 20, 30, 40};
 };
 
@@ -153,7 +153,7 @@ TEST_F(BatchingTest, FilledRectanglesAndCirclesKeepThirtyTwoBitCoordinates)
     EXPECT_EQ(kWidth * kHeight, RedPixels()) << "the rectangles cover the whole canvas";
 
     m_canvas.Fill(RGB(255, 255, 255));
-    Tavo_GrDPoint centre = At(40000, 50);
+    Tavo_GrDPoint centre{40000, 50};
     m_surface->DrawCircle(centre, 39950, &m_attr);
     m_surface->Flush();
     const std::vector<GdiCall> ellipses = m_recorder.Of(GdiCall::Ellipse);

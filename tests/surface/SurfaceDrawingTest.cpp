@@ -10,7 +10,7 @@ protected:
 
 TEST_F(DrawingTest, DotIsExactlyOnePixelAtTheFlippedPosition)
 {
-    Tavo_GrDPoint p = At(17, 30);
+    Tavo_GrDPoint p{17, 30};
     m_surface->DrawDot(p, &m_red);
     EndPass();
     EXPECT_EQ(1, RedPixels());
@@ -44,7 +44,7 @@ TEST_F(DrawingTest, RectangleEdgesAreInclusiveAndAOnePointRectangleCoversOnePixe
 
 TEST_F(DrawingTest, VerticalLinesBeyondTheSurfaceAreClampedSlantedOnesAreNot)
 {
-    Tavo_GrDPoint a = At(30, -100), b = At(30, kHeight + 50), c = At(31, kHeight + 50);
+    Tavo_GrDPoint a{30, -100}, b{30, kHeight + 50}, c{31, kHeight + 50};
     m_surface->DrawLine(a, b, &m_red);
     m_surface->DrawLine(a, c, &m_red);
     EndPass();
@@ -63,14 +63,13 @@ TEST_F(DrawingTest, ThickeningWidensVerticalLinesToTheRightOnly)
         int columns;
     } cases[] = {{nullptr, 2, false, 3}, {"2", 0, false, 3}, {nullptr, 2, true, 1}};
     for (const auto& c : cases) {
-        SCOPED_TRACE(testing::Message() << (c.environment ? c.environment : "unset") << ", " << c.thicken << ", gate "
-                                        << (c.gateClosed ? "0" : "default"));
+        SCOPED_TRACE(testing::Message() << "case " << &c - cases);
         CreateSurface("BRY_VWR_THICKENVERTICALLINE", c.environment);
         if (c.thicken)
             m_surface->SetThickenVertLine(c.thicken);
         if (c.gateClosed)
             m_surface->SetThickenGate(0.0);
-        Tavo_GrDPoint a = At(10, 20), b = At(10, 60), d = At(50, 80), e = At(90, 80);
+        Tavo_GrDPoint a{10, 20}, b{10, 60}, d{50, 80}, e{90, 80};
         m_surface->DrawLine(a, b, &m_red);
         m_surface->DrawLine(d, e, &m_red);
         EndPass();
@@ -82,7 +81,7 @@ TEST_F(DrawingTest, ThickeningWidensVerticalLinesToTheRightOnly)
 
 TEST_F(DrawingTest, BadInputDrawsNothing)
 {
-    Tavo_GrDPoint points[1] = {At(10, 20)};
+    Tavo_GrDPoint points[1] = {{10, 20}};
     m_surface->DrawPline(1, points, &m_red);
     m_surface->DrawPline(-3, points, &m_red);
     m_surface->DrawPline(3, nullptr, &m_red);

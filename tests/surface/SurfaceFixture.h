@@ -32,8 +32,6 @@ inline Tavo_GrAttr Filled(char colour, int charHeight = 0, char align = Tavo_GrA
     return Tavo_GrAttr(colour, 1, charHeight, align);
 }
 
-inline Tavo_GrDPoint At(int x, int y) { return Tavo_GrDPoint{x, y}; }
-
 // POINT is a global type: its comparison and printing must be found there.
 inline bool operator==(const POINT& a, const POINT& b) { return a.x == b.x && a.y == b.y; }
 inline void PrintTo(const POINT& point, std::ostream* out) { *out << "(" << point.x << ", " << point.y << ")"; }

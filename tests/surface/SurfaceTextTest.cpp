@@ -17,7 +17,7 @@ TEST_F(SurfaceTest, TextTooSmallToReadIsALineOfItsWidthPlacedByTheAlignment)
         SCOPED_TRACE(testing::Message() << "alignment " << int(c.align));
         CreateSurface();
         Tavo_GrAttr attr = Outline(kRed, 2, c.align); // 2 pixels at scale 1
-        Tavo_GrDPoint p = At(c.x, 50);
+        Tavo_GrDPoint p{c.x, 50};
         m_surface->DrawText("abcde", p, &attr);
         EndPass();
         EXPECT_EQ(10, RedPixels()) << "5 characters x 2 pixels";
@@ -39,7 +39,7 @@ TEST_F(SurfaceTest, BoxTextWrapsAtAnyCharacterAndMarksWhatDoesNotFit)
     const int kFontPixels = 20;
     Tavo_GrAttr attr = Outline(kRed, kFontPixels);
     // Measured in the surface's own font, which stays selected while the pass lasts.
-    Tavo_GrDPoint origin = At(0, 0);
+    Tavo_GrDPoint origin{0, 0};
     m_surface->DrawText("M", origin, &attr);
     SIZE letter = {};
     GetTextExtentPoint32A(m_canvas.GetDC(), "M", 1, &letter);
@@ -79,7 +79,7 @@ TEST_F(SurfaceTest, TextBelowTheMinimumFontIsDrawnAtTheMinimumHeight)
     for (int i = 0; i < 2; ++i) {
         CreateSurface("BRY_VWR_MINFONT", minFonts[i]);
         Tavo_GrAttr attr = Outline(kRed, 5);
-        Tavo_GrDPoint p = At(20, 60);
+        Tavo_GrDPoint p{20, 60};
         m_surface->DrawText("HH", p, &attr); // capitals without descenders
         EndPass();
         for (int y = 0; y < kHeight; ++y)
