@@ -129,14 +129,6 @@ std::ostream& operator<<(std::ostream& out, const Call& call)
                << ", " << call.point.y << "), completed " << call.completed << ")";
 }
 
-COLORREF PixelAt(HWND window, int x, int y)
-{
-    HDC dc = ::GetDC(window);
-    const COLORREF colour = ::GetPixel(dc, x, y);
-    ::ReleaseDC(window, dc);
-    return colour;
-}
-
 CRect ChildRect(HWND child)
 {
     CRect rect;

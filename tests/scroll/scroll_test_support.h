@@ -39,12 +39,7 @@ DWORD FreshTime();
 class TestWindow
 {
 public:
-    struct Note
-    {
-        HWND window;
-        UINT message;
-        WPARAM wParam;
-    };
+    struct Note { HWND window; UINT message; WPARAM wParam; };
 
     explicit TestWindow(const CRect& rect, HWND parent = nullptr);
     ~TestWindow();
@@ -91,11 +86,7 @@ public:
     }
     void Clear() { calls.clear(); }
 
-    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override
-    {
-        if (painter)
-            painter(scrollee, dc);
-    }
+    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override { if (painter) painter(scrollee, dc); }
     // Records only the calls that really move pixels.
     void GetScrollDeviceDeltas(const CPoint& a, const CPoint& b, int& dx, int& dy, int scrolling) override
     {
@@ -111,7 +102,7 @@ public:
     {
         calls.push_back({"DragEnd", button, flags, point, completed});
     }
-    void OnDragAbort() override { Record("DragAbort", CPoint(0, 0)); }
+    void OnDragAbort() override { Record("DragAbort"); }
     void OnParkedCursorStart(const CPoint& point) override
     {
         Record("ParkedStart", point);
@@ -119,7 +110,7 @@ public:
     }
     void OnParkedCursorEnd() override
     {
-        Record("ParkedEnd", CPoint(0, 0));
+        Record("ParkedEnd");
         Tavo_WiScrollWnd::OnParkedCursorEnd();
     }
     CString GetDataTipText(const CPoint& point) override
@@ -133,14 +124,14 @@ public:
     void OnNonDragScrollEnd(const CPoint& position) override { Record("NonDragScrollEnd", position); }
 
 private:
-    void Record(const char* name, const CPoint& point, UINT button = 0, UINT flags = 0)
+    void Record(const char* name, const CPoint& point = CPoint(0, 0), UINT button = 0, UINT flags = 0)
     {
         calls.push_back({name, button, flags, point});
     }
 };
 
 // A pixel of a window's client area as on screen.
-COLORREF PixelAt(HWND window, int x, int y);
+inline COLORREF PixelAt(HWND window, int x, int y) { return CClientDC(CWnd::FromHandle(window)).GetPixel(x, y); }
 
 // The window rectangle of child in its parent's client coordinates.
 CRect ChildRect(HWND child);

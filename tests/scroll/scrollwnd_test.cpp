@@ -117,24 +117,16 @@ TEST_F(ScrollWndTest, BarsHoldTheRangeScaledToTheirLimitWithItsEndsRoundedOutwar
 
 TEST_F(ScrollWndTest, ThumbPositionsMapBackFromBarUnitsBeyondSixteenBits)
 {
-    // Scale 2.0 on x: a window of 200 units is a page of 100 bar units and
-    // position 1000 is bar position 500.
-    wnd.SetScrollRange(0, 2 * 32767, 0, 100);
+    // Bar ranges of -2 .. 32766 (scale 2.0: a window of 200 units is a page
+    // of 100 bar units) and 200000 .. 230000. The message carries the low 16
+    // bits of the thumb position only.
+    wnd.SetScrollRange(-3, 65531, 200000, 230000);
     wnd.SetScrollWindowExtent(200, 10);
-    wnd.SetScrollPosition(CPoint(1000, 7));
+    wnd.SetScrollPosition(CPoint(1000, 200007));
     const SCROLLINFO h = BarInfo(HorzBar());
     EXPECT_EQ(h.nPage, 100u);
     EXPECT_EQ(h.nPos, 500);
-    EXPECT_EQ(BarInfo(VertBar()).nPos, 7);
-    SendScroll(WM_HSCROLL, SB_THUMBTRACK, 1234);
-    EXPECT_EQ(wnd.GetScrollPosition().x, 2468);
-    SendScroll(WM_HSCROLL, SB_ENDSCROLL);
-
-    // Bar ranges of -2 .. 32766 (scale 2.0) and 200000 .. 230000: the message
-    // carries the low 16 bits of the thumb position only.
-    wnd.SetScrollRange(-3, 65531, 200000, 230000);
-    wnd.SetScrollWindowExtent(0, 0);
-    wnd.SetScrollPosition(CPoint(1000, 200000));
+    EXPECT_EQ(BarInfo(VertBar()).nPos, 200007);
     SendScroll(WM_HSCROLL, SB_THUMBTRACK, 0xFFFF & -2);
     EXPECT_EQ(wnd.GetScrollPosition().x, -4);
     SendScroll(WM_VSCROLL, SB_THUMBTRACK, 0xFFFF & 210000);
@@ -346,8 +338,6 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
     };
     ::InvalidateRect(Scrollee(), nullptr, TRUE);
     ::UpdateWindow(Scrollee());
-    ASSERT_EQ(PixelAt(Scrollee(), 0, 0), StripeColour(0));
-    ASSERT_EQ(PixelAt(Scrollee(), 8, 0), StripeColour(8));
     wnd.painter = nullptr;
 
     // 13 units right moves the content 13 pixels left, then 5 units back 5 pixels right.
