@@ -36,22 +36,12 @@ bool FindRuntimeHeap()
     return false;
 }
 
-void* CountedMalloc(size_t size)
+// Counts a call, then forwards it to the runtime's own function.
+template <auto& runtime, class... Arguments>
+void* Counted(Arguments... arguments)
 {
     ++g_calls;
-    return g_malloc(size);
-}
-
-void* CountedCalloc(size_t count, size_t size)
-{
-    ++g_calls;
-    return g_calloc(count, size);
-}
-
-void* CountedRealloc(void* block, size_t size)
-{
-    ++g_calls;
-    return g_realloc(block, size);
+    return runtime(arguments...);
 }
 
 } // namespace
@@ -62,9 +52,9 @@ HeapCallCounter::HeapCallCounter(const std::vector<HMODULE>& modules)
     if (!FindRuntimeHeap())
         return;
     const std::pair<const char*, void*> functions[] = {
-        {"malloc", reinterpret_cast<void*>(&CountedMalloc)},
-        {"calloc", reinterpret_cast<void*>(&CountedCalloc)},
-        {"realloc", reinterpret_cast<void*>(&CountedRealloc)},
+        {"malloc", reinterpret_cast<void*>(&Counted<g_malloc, size_t>)},
+        {"calloc", reinterpret_cast<void*>(&Counted<g_calloc, size_t, size_t>)},
+        {"realloc", reinterpret_cast<void*>(&Counted<g_realloc, void*, size_t>)},
     };
     m_patches.reserve(modules.size() * 3); // no reallocation while imports are redirected
     for (const HMODULE module : modules) {
