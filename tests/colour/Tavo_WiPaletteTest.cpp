@@ -46,7 +46,8 @@ TEST_F(PaletteTest, UserNameLookups)
         const char* name;
         char index;
     } rows[] = {
-        {"grey", 8}, {"Grey", 8}, {"GREY", 8}, {"Dark Red", 13},
+        {"grey", 8}, {"Grey", 8}, {"GREY", 8}, {"Dark Red", 13}, {"dark-gray", 9},
+        {"darkgray", 42}, {"reddish", 42}, // separators matter, and the whole name
         // Special names never reach the table.
         {"DEFAULT", -3}, {"Inherit", -2}, {"transparent", -1},
         {"mauve", 42}, {nullptr, 42}, // the caller's default

@@ -16,7 +16,7 @@ std::string Text(const CString& value)
     return std::string(value.GetString(), value.GetLength());
 }
 
-TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimalAndOtherPercentSignsStay)
+TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimalOnceAndOtherPercentSignsStay)
 {
     EXPECT_EQ(Text((Gui_Msg(100, kThisProgram) << 3 << -12).GetValue()), "Value 3 of -12");
     EXPECT_EQ(Text((Gui_Msg(101, kThisProgram) << 7).GetValue()), "100% sure, %3 stays, 77");
@@ -24,24 +24,10 @@ TEST(MessageText, ArgumentsReplaceTheirNumbersInDecimalAndOtherPercentSignsStay)
     for (int i = 1; i <= 12; ++i)
         twoDigits << i * 10;
     EXPECT_EQ(Text(twoDigits.GetValue()), "120 and 10");
-}
-
-// Message text never reaches a printf-style formatter.
-TEST(MessageText, ArgumentTextIsNeverFormattedAgain)
-{
+    // Argument text is never formatted again: it never reaches a printf-style formatter.
     EXPECT_EQ(Gui_Msg::Substitute("%1%2", {"%2", "%s%n"}), "%2%s%n");
     EXPECT_EQ(Gui_Msg::Substitute("50%", {}), "50%");
     EXPECT_EQ(Gui_Msg::Substitute("%0 %a %%1", {"x"}), "%0 %a %1");
-}
-
-TEST(MessageText, StringsOfLaterBlocksAreFoundAndAMissingStringGivesTheEmptyText)
-{
-    std::string text;
-    ASSERT_TRUE(Gui_Msg::LoadText(117, kThisProgram, text));
-    EXPECT_EQ(text, "block two");
-    EXPECT_FALSE(Gui_Msg::LoadText(103, kThisProgram, text));
-    EXPECT_FALSE(Gui_Msg::LoadText(100, nullptr, text)) << "nothing registered yet";
-    EXPECT_TRUE(Gui_Msg(4000, kThisProgram).GetValue().IsEmpty());
 }
 
 TEST(MessageLookup, RegisteredModulesAreSearchedWhenNoModuleIsGiven)

@@ -1,11 +1,10 @@
 // The graphics core's library object: palette ownership, initialisation
-// count, trace sink; and the base palette's colour-name rule.
+// count, trace sink.
 #include "Tavo_GrLibrary.h"
 #include "Tavo_GrPalette.h"
 
 #include <gtest/gtest.h>
 
-#include <utility>
 #include <vector>
 
 namespace {
@@ -61,17 +60,6 @@ TEST_F(LibraryTest, TraceHandsTheMessageToTheSinkUnchangedAndIgnoresNull)
     Tavo_GrLibrary::Trace(message);
     Tavo_GrLibrary::Trace(nullptr);
     EXPECT_EQ(seen, std::vector<const char*>{message}) << "the caller's very bytes, once";
-}
-
-// ---- The base palette --------------------------------------------------------------
-
-TEST(BasePalette, ColourNamesCompareWithoutCaseAndWithSeparatorsAlike)
-{
-    EXPECT_EQ(Tavo_GrPalette::CompareColorNames("dark_gray", "Dark Gray"), 0);
-    EXPECT_EQ(Tavo_GrPalette::CompareColorNames("dark-gray", "DARK_GRAY"), 0);
-    for (auto [a, b] : {std::pair<const char*, const char*>{"darkgray", "dark_gray"}, {"red", "reddish"}, {nullptr, "red"},
-                        {nullptr, nullptr}})
-        EXPECT_NE(Tavo_GrPalette::CompareColorNames(a, b), 0) << (a ? a : "(null)") << " / " << (b ? b : "(null)");
 }
 
 } // namespace

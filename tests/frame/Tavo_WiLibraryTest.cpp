@@ -15,6 +15,7 @@
 #include <algorithm>
 #include <string>
 #include <tuple>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -64,21 +65,14 @@ TEST(LibraryLoad, TheFirstAttachLinkedTheLibraryIntoTheFrameworkAndTheMessageLoo
 
 TEST(LibraryEntry, ASecondProcessAttachAndOtherNotificationsChangeNothing)
 {
-    const struct {
-        HINSTANCE instance;
-        DWORD reason;
-    } calls[] = {
-        // Another instance handle: work done again would show in the record or
-        // in the registered resource modules.
-        {GetModuleHandleA(nullptr), DLL_PROCESS_ATTACH},
-        {LibraryModule(), DLL_THREAD_ATTACH},
-        {LibraryModule(), DLL_THREAD_DETACH},
-        {LibraryModule(), DLL_PROCESS_DETACH},
-    };
-    for (const auto& call : calls) {
-        SCOPED_TRACE(call.reason);
+    // The second attach comes with another instance handle: work done again
+    // would show in the record or in the registered resource modules.
+    for (auto [instance, reason] : {std::pair<HINSTANCE, DWORD>{GetModuleHandleA(nullptr), DLL_PROCESS_ATTACH},
+                                    {LibraryModule(), DLL_THREAD_ATTACH}, {LibraryModule(), DLL_THREAD_DETACH},
+                                    {LibraryModule(), DLL_PROCESS_DETACH}}) {
+        SCOPED_TRACE(reason);
         const auto before = AttachState();
-        EXPECT_EQ(Tavo_WiLibraryEntry(call.instance, call.reason, nullptr), TRUE);
+        EXPECT_EQ(Tavo_WiLibraryEntry(instance, reason, nullptr), TRUE);
         EXPECT_EQ(AttachState(), before);
     }
 }
@@ -170,8 +164,7 @@ TEST(LibraryCursor, ThePanCursorIsAMonochrome32By32CursorWithItsHotSpotInTheMidd
     BITMAP mask{};
     GetObjectA(info.hbmMask, sizeof mask, &mask);
     DeleteObject(info.hbmMask);
-    EXPECT_EQ(mask.bmWidth, 32);
-    EXPECT_EQ(mask.bmHeight, 64) << "32 x 32: the AND mask above the XOR mask";
+    EXPECT_TRUE(mask.bmWidth == 32 && mask.bmHeight == 64) << "32 x 32: the AND mask above the XOR mask";
 }
 
 } // namespace
