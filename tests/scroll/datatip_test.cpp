@@ -21,12 +21,9 @@ constexpr int ScreenHeight = 1024;
 // pointer + (16, 16) is where the text starts, with margins of 4 and 2 pixels.
 CRect ExpectedRect(CPoint pointer, const char* text)
 {
-    HDC dc = ::GetDC(nullptr);
-    HGDIOBJ old = ::SelectObject(dc, ::GetStockObject(ANSI_VAR_FONT));
-    SIZE extent = {};
-    ::GetTextExtentPoint32A(dc, text, static_cast<int>(strlen(text)), &extent);
-    ::SelectObject(dc, old);
-    ::ReleaseDC(nullptr, dc);
+    CClientDC dc(CWnd::FromHandle(::GetDesktopWindow()));
+    dc.SelectStockObject(ANSI_VAR_FONT);
+    const CSize extent = dc.GetTextExtent(CString(text));
     const CPoint origin = pointer + CPoint(16, 16);
     return CRect(origin.x - 4, origin.y - 2, origin.x + extent.cx + 4, origin.y + extent.cy + 2);
 }
@@ -59,19 +56,12 @@ protected:
         TestWindow::Notes().clear();
     }
 
-    void TearDown() override
-    {
-        tipA.DestroyWindow();
-        tipB.DestroyWindow();
-        PumpPending();
-    }
-
+    // The tips go first, each destroying its window while its owner lives.
     TestWindow ownerA{CRect(100, 100, 400, 300)};
     TestWindow ownerB{CRect(500, 100, 800, 300)};
     Tavo_WiDataTip tipA;
     Tavo_WiDataTip tipB;
 };
-
 
 TEST_F(DataTipTest, TipIsMovedOntoTheScreenHorizontallyButNeverUp)
 {

@@ -117,12 +117,6 @@ TestWindow::~TestWindow()
     PumpPending();
 }
 
-std::vector<TestWindow::Note>& TestWindow::Notes()
-{
-    static std::vector<Note> notes;
-    return notes;
-}
-
 std::ostream& operator<<(std::ostream& out, const Call& call)
 {
     return out << call.name << "(button " << call.button << ", flags " << call.flags << ", (" << call.point.x

@@ -48,9 +48,10 @@ public:
 
     HWND Handle() const { return m_hwnd; }
     CWnd* Wnd() { return &m_wnd; }
-    static std::vector<Note>& Notes();
+    static std::vector<Note>& Notes() { return s_notes; }
 
 private:
+    static inline std::vector<Note> s_notes;
     HWND m_hwnd = nullptr;
     CWnd m_wnd;
 };

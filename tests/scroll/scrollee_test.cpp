@@ -71,8 +71,6 @@ protected:
     DWORD base = 0;
 };
 
-// ---- clicks and double clicks ----------------------------------------------------------
-
 TEST_F(ScrolleeTest, ReleaseBeforeHoldTimeIsAClickWithTheReleasesFlagsAndPointAndAtItNothing)
 {
     // Presses 400 ms apart, the same button never twice in a row, so that no two make a double click.
@@ -111,8 +109,6 @@ TEST_F(ScrolleeTest, PressReleaseDoubleClickReleaseIsAClickThenADoubleClick)
     EXPECT_EQ(wnd.calls,
               (std::vector<Call>{{"Click", MK_LBUTTON, 0, {40, 40}}, {"DoubleClick", MK_LBUTTON, MK_LBUTTON, {40, 40}}}));
 }
-
-// ---- drags ---------------------------------------------------------------------------------
 
 TEST_F(ScrolleeTest, HoldTimerStartsADragWhoseMovesNeedAButtonFlag)
 {
@@ -173,8 +169,6 @@ TEST_F(ScrolleeTest, PressWhileTheScrolleeHoldsItsOwnCaptureReportsNothing)
     EXPECT_TRUE(wnd.calls.empty());
 }
 
-// ---- painting and resting --------------------------------------------------------------------
-
 TEST_F(ScrolleeTest, EraseFillsBlackUntilABackgroundColourIsSet)
 {
     const auto repaintOverWhite = [this] {
@@ -209,8 +203,6 @@ TEST_F(ScrolleeTest, PreTranslatedMovesReachTheMonitorAndARestShowsTheTip)
     EXPECT_EQ(wnd.Count("ParkedEnd"), 1);
     EXPECT_FALSE(::IsWindowVisible(tip));
 }
-
-// ---- window classes --------------------------------------------------------------------------
 
 std::string ClassOf(HWND hwnd)
 {

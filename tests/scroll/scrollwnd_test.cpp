@@ -71,8 +71,6 @@ protected:
     RecordingScrollWnd wnd;
 };
 
-// ---- the scroll model on the bars ----------------------------------------------------
-
 TEST(ScrollMath, BarUnitsRoundAwayFromZeroUnlessWhole)
 {
     const struct { int value; double scale; int expected; } cases[] = {
@@ -161,8 +159,6 @@ TEST(ScrollWndWithoutWindow, ModelWorksBeforeCreateAndTouchesNoWindow)
     EXPECT_EQ(unborn.GetSafeHwnd(), nullptr);
 }
 
-// ---- scroll codes and steps ------------------------------------------------------------
-
 TEST_F(ScrollWndTest, EveryScrollCodeMovesToItsTargetAndTheBarShowsIt)
 {
     // From (500, 500): the target normally and with y inverted (y grows
@@ -248,8 +244,6 @@ TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
     EXPECT_EQ(wnd.GetScrollPosition().x, 50000000);
 }
 
-// ---- ScrollWindowTest and drag scrolling -------------------------------------------------
-
 TEST_F(ScrollWndTest, ScrollWindowTestChangesNeitherPositionNorBarsNorPixels)
 {
     SetSquareModel(wnd, CPoint(900, 500));
@@ -290,8 +284,6 @@ TEST_F(ScrollWndTest, ThumbCodesDragScrollAndTheEndCodeEndsWhicheverScrollRan)
         {"ScrollDeltas", 0, 0, {310, 510}},    {"NonDragScrollEnd", 0, 0, {310, 510}}};
     EXPECT_EQ(wnd.calls, expected);
 }
-
-// ---- layout and pixels ----------------------------------------------------------------------
 
 TEST_F(ScrollWndTest, BarAppearsOnlyWhenTheRangeIsWiderThanTheWindowAndTheChildrenTileIt)
 {
@@ -354,8 +346,6 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
             ASSERT_EQ(PixelAt(Scrollee(), x, 150), StripeColour(x + step.x)) << "column " << x;
     }
 }
-
-// ---- destruction ------------------------------------------------------------------------------
 
 TEST_F(ScrollWndTest, DestructionTakesEveryWindowOfTheFamilyWithIt)
 {
