@@ -50,8 +50,6 @@ protected:
             if (::GetAsyncKeyState(static_cast<int>(release[0])) & 0x8000)
                 Input(release[1], CPoint(1, 1), 1900);
         ::ReleaseCapture();
-        wnd.DestroyWindow();
-        PumpPending();
     }
 
     HWND Scrollee() { return wnd.GetScrollee()->GetSafeHwnd(); }
