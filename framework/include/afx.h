@@ -92,11 +92,10 @@
 // GetSafeHwnd, GetSafeHdc and GetSafeHandle may be called through a null
 // pointer, as the framework allows; reading `this` back through a volatile
 // keeps the compiler from assuming that it is never null.
-template <class T>
-inline const T* AfxNullableThis(const T* p) noexcept
+template <class T> inline const T* AfxNullableThis(const T* p) noexcept
 {
-  const T* volatile q = p;
-  return q;
+    const T* volatile q = p;
+    return q;
 }
 
 // ---------------------------------------------------------------------------
@@ -106,145 +105,294 @@ inline const T* AfxNullableThis(const T* p) noexcept
 class CPoint;
 class CRect;
 
-class CSize : public tagSIZE {
+class CSize : public tagSIZE
+{
 public:
-  CSize() noexcept { cx = 0; cy = 0; }
-  CSize(int initCX, int initCY) noexcept { cx = initCX; cy = initCY; }
-  CSize(SIZE initSize) noexcept { cx = initSize.cx; cy = initSize.cy; }
-  CSize(POINT initPt) noexcept { cx = initPt.x; cy = initPt.y; }
-  CSize(DWORD dwSize) noexcept { cx = (short)LOWORD(dwSize); cy = (short)HIWORD(dwSize); }
+    CSize() noexcept
+    {
+        cx = 0;
+        cy = 0;
+    }
+    CSize(int initCX, int initCY) noexcept
+    {
+        cx = initCX;
+        cy = initCY;
+    }
+    CSize(SIZE initSize) noexcept
+    {
+        cx = initSize.cx;
+        cy = initSize.cy;
+    }
+    CSize(POINT initPt) noexcept
+    {
+        cx = initPt.x;
+        cy = initPt.y;
+    }
+    CSize(DWORD dwSize) noexcept
+    {
+        cx = (short)LOWORD(dwSize);
+        cy = (short)HIWORD(dwSize);
+    }
 
-  BOOL operator==(SIZE size) const noexcept { return cx == size.cx && cy == size.cy; }
-  BOOL operator!=(SIZE size) const noexcept { return !(*this == size); }
-  void operator+=(SIZE size) noexcept { cx += size.cx; cy += size.cy; }
-  void operator-=(SIZE size) noexcept { cx -= size.cx; cy -= size.cy; }
-  void SetSize(int CX, int CY) noexcept { cx = CX; cy = CY; }
+    BOOL operator==(SIZE size) const noexcept { return cx == size.cx && cy == size.cy; }
+    BOOL operator!=(SIZE size) const noexcept { return !(*this == size); }
+    void operator+=(SIZE size) noexcept
+    {
+        cx += size.cx;
+        cy += size.cy;
+    }
+    void operator-=(SIZE size) noexcept
+    {
+        cx -= size.cx;
+        cy -= size.cy;
+    }
+    void SetSize(int CX, int CY) noexcept
+    {
+        cx = CX;
+        cy = CY;
+    }
 
-  CSize operator+(SIZE size) const noexcept { return CSize(cx + size.cx, cy + size.cy); }
-  CSize operator-(SIZE size) const noexcept { return CSize(cx - size.cx, cy - size.cy); }
-  CSize operator-() const noexcept { return CSize(-cx, -cy); }
-  inline CPoint operator+(POINT point) const noexcept;
-  inline CPoint operator-(POINT point) const noexcept;
+    CSize operator+(SIZE size) const noexcept { return CSize(cx + size.cx, cy + size.cy); }
+    CSize operator-(SIZE size) const noexcept { return CSize(cx - size.cx, cy - size.cy); }
+    CSize operator-() const noexcept { return CSize(-cx, -cy); }
+    inline CPoint operator+(POINT point) const noexcept;
+    inline CPoint operator-(POINT point) const noexcept;
 };
 
-class CPoint : public tagPOINT {
+class CPoint : public tagPOINT
+{
 public:
-  CPoint() noexcept { x = 0; y = 0; }
-  CPoint(int initX, int initY) noexcept { x = initX; y = initY; }
-  CPoint(POINT initPt) noexcept { x = initPt.x; y = initPt.y; }
-  CPoint(SIZE initSize) noexcept { x = initSize.cx; y = initSize.cy; }
-  // The packed coordinates of a mouse message: signed 16-bit x and y.
-  CPoint(LPARAM dwPoint) noexcept { x = GET_X_LPARAM(dwPoint); y = GET_Y_LPARAM(dwPoint); }
+    CPoint() noexcept
+    {
+        x = 0;
+        y = 0;
+    }
+    CPoint(int initX, int initY) noexcept
+    {
+        x = initX;
+        y = initY;
+    }
+    CPoint(POINT initPt) noexcept
+    {
+        x = initPt.x;
+        y = initPt.y;
+    }
+    CPoint(SIZE initSize) noexcept
+    {
+        x = initSize.cx;
+        y = initSize.cy;
+    }
+    // The packed coordinates of a mouse message: signed 16-bit x and y.
+    CPoint(LPARAM dwPoint) noexcept
+    {
+        x = GET_X_LPARAM(dwPoint);
+        y = GET_Y_LPARAM(dwPoint);
+    }
 
-  void Offset(int xOffset, int yOffset) noexcept { x += xOffset; y += yOffset; }
-  void Offset(POINT point) noexcept { Offset(point.x, point.y); }
-  void Offset(SIZE size) noexcept { Offset(size.cx, size.cy); }
-  void SetPoint(int X, int Y) noexcept { x = X; y = Y; }
+    void Offset(int xOffset, int yOffset) noexcept
+    {
+        x += xOffset;
+        y += yOffset;
+    }
+    void Offset(POINT point) noexcept { Offset(point.x, point.y); }
+    void Offset(SIZE size) noexcept { Offset(size.cx, size.cy); }
+    void SetPoint(int X, int Y) noexcept
+    {
+        x = X;
+        y = Y;
+    }
 
-  BOOL operator==(POINT point) const noexcept { return x == point.x && y == point.y; }
-  BOOL operator!=(POINT point) const noexcept { return !(*this == point); }
-  void operator+=(SIZE size) noexcept { Offset(size); }
-  void operator-=(SIZE size) noexcept { Offset(-size.cx, -size.cy); }
-  void operator+=(POINT point) noexcept { Offset(point); }
-  void operator-=(POINT point) noexcept { Offset(-point.x, -point.y); }
+    BOOL operator==(POINT point) const noexcept { return x == point.x && y == point.y; }
+    BOOL operator!=(POINT point) const noexcept { return !(*this == point); }
+    void operator+=(SIZE size) noexcept { Offset(size); }
+    void operator-=(SIZE size) noexcept { Offset(-size.cx, -size.cy); }
+    void operator+=(POINT point) noexcept { Offset(point); }
+    void operator-=(POINT point) noexcept { Offset(-point.x, -point.y); }
 
-  CPoint operator+(SIZE size) const noexcept { return CPoint(x + size.cx, y + size.cy); }
-  CPoint operator-(SIZE size) const noexcept { return CPoint(x - size.cx, y - size.cy); }
-  CPoint operator-() const noexcept { return CPoint(-x, -y); }
-  CPoint operator+(POINT point) const noexcept { return CPoint(x + point.x, y + point.y); }
-  CSize operator-(POINT point) const noexcept { return CSize(x - point.x, y - point.y); }
+    CPoint operator+(SIZE size) const noexcept { return CPoint(x + size.cx, y + size.cy); }
+    CPoint operator-(SIZE size) const noexcept { return CPoint(x - size.cx, y - size.cy); }
+    CPoint operator-() const noexcept { return CPoint(-x, -y); }
+    CPoint operator+(POINT point) const noexcept { return CPoint(x + point.x, y + point.y); }
+    CSize operator-(POINT point) const noexcept { return CSize(x - point.x, y - point.y); }
 };
 
 inline CPoint CSize::operator+(POINT point) const noexcept { return CPoint(cx + point.x, cy + point.y); }
 inline CPoint CSize::operator-(POINT point) const noexcept { return CPoint(cx - point.x, cy - point.y); }
 
-class CRect : public tagRECT {
+class CRect : public tagRECT
+{
 public:
-  CRect() noexcept { left = top = right = bottom = 0; }
-  CRect(int l, int t, int r, int b) noexcept { left = l; top = t; right = r; bottom = b; }
-  CRect(const RECT& srcRect) noexcept { ::CopyRect(this, &srcRect); }
-  CRect(LPCRECT lpSrcRect) noexcept { ::CopyRect(this, lpSrcRect); }
-  CRect(POINT point, SIZE size) noexcept
-  { left = point.x; top = point.y; right = left + size.cx; bottom = top + size.cy; }
-  CRect(POINT topLeft, POINT bottomRight) noexcept
-  { left = topLeft.x; top = topLeft.y; right = bottomRight.x; bottom = bottomRight.y; }
+    CRect() noexcept { left = top = right = bottom = 0; }
+    CRect(int l, int t, int r, int b) noexcept
+    {
+        left = l;
+        top = t;
+        right = r;
+        bottom = b;
+    }
+    CRect(const RECT& srcRect) noexcept { ::CopyRect(this, &srcRect); }
+    CRect(LPCRECT lpSrcRect) noexcept { ::CopyRect(this, lpSrcRect); }
+    CRect(POINT point, SIZE size) noexcept
+    {
+        left = point.x;
+        top = point.y;
+        right = left + size.cx;
+        bottom = top + size.cy;
+    }
+    CRect(POINT topLeft, POINT bottomRight) noexcept
+    {
+        left = topLeft.x;
+        top = topLeft.y;
+        right = bottomRight.x;
+        bottom = bottomRight.y;
+    }
 
-  int Width() const noexcept { return right - left; }
-  int Height() const noexcept { return bottom - top; }
-  CSize Size() const noexcept { return CSize(Width(), Height()); }
-  // TopLeft and BottomRight view the two corners in place, as the
-  // framework's do (a RECT is two POINTs in a row).
-  CPoint& TopLeft() noexcept { return *reinterpret_cast<CPoint*>(this); }
-  CPoint& BottomRight() noexcept { return *(reinterpret_cast<CPoint*>(this) + 1); }
-  const CPoint& TopLeft() const noexcept { return *reinterpret_cast<const CPoint*>(this); }
-  const CPoint& BottomRight() const noexcept { return *(reinterpret_cast<const CPoint*>(this) + 1); }
-  CPoint CenterPoint() const noexcept { return CPoint((left + right) / 2, (top + bottom) / 2); }
+    int Width() const noexcept { return right - left; }
+    int Height() const noexcept { return bottom - top; }
+    CSize Size() const noexcept { return CSize(Width(), Height()); }
+    // TopLeft and BottomRight view the two corners in place, as the
+    // framework's do (a RECT is two POINTs in a row).
+    CPoint& TopLeft() noexcept { return *reinterpret_cast<CPoint*>(this); }
+    CPoint& BottomRight() noexcept { return *(reinterpret_cast<CPoint*>(this) + 1); }
+    const CPoint& TopLeft() const noexcept { return *reinterpret_cast<const CPoint*>(this); }
+    const CPoint& BottomRight() const noexcept { return *(reinterpret_cast<const CPoint*>(this) + 1); }
+    CPoint CenterPoint() const noexcept { return CPoint((left + right) / 2, (top + bottom) / 2); }
 
-  operator LPRECT() noexcept { return this; }
-  operator LPCRECT() const noexcept { return this; }
+    operator LPRECT() noexcept { return this; }
+    operator LPCRECT() const noexcept { return this; }
 
-  BOOL IsRectEmpty() const noexcept { return ::IsRectEmpty(this); }
-  BOOL IsRectNull() const noexcept { return left == 0 && right == 0 && top == 0 && bottom == 0; }
-  BOOL PtInRect(POINT point) const noexcept { return ::PtInRect(this, point); }
+    BOOL IsRectEmpty() const noexcept { return ::IsRectEmpty(this); }
+    BOOL IsRectNull() const noexcept { return left == 0 && right == 0 && top == 0 && bottom == 0; }
+    BOOL PtInRect(POINT point) const noexcept { return ::PtInRect(this, point); }
 
-  void SetRect(int x1, int y1, int x2, int y2) noexcept { ::SetRect(this, x1, y1, x2, y2); }
-  void SetRect(POINT topLeft, POINT bottomRight) noexcept
-  { ::SetRect(this, topLeft.x, topLeft.y, bottomRight.x, bottomRight.y); }
-  void SetRectEmpty() noexcept { ::SetRectEmpty(this); }
-  void CopyRect(LPCRECT lpSrcRect) noexcept { ::CopyRect(this, lpSrcRect); }
-  BOOL EqualRect(LPCRECT lpRect) const noexcept { return ::EqualRect(this, lpRect); }
+    void SetRect(int x1, int y1, int x2, int y2) noexcept { ::SetRect(this, x1, y1, x2, y2); }
+    void SetRect(POINT topLeft, POINT bottomRight) noexcept
+    {
+        ::SetRect(this, topLeft.x, topLeft.y, bottomRight.x, bottomRight.y);
+    }
+    void SetRectEmpty() noexcept { ::SetRectEmpty(this); }
+    void CopyRect(LPCRECT lpSrcRect) noexcept { ::CopyRect(this, lpSrcRect); }
+    BOOL EqualRect(LPCRECT lpRect) const noexcept { return ::EqualRect(this, lpRect); }
 
-  void InflateRect(int x, int y) noexcept { ::InflateRect(this, x, y); }
-  void InflateRect(SIZE size) noexcept { ::InflateRect(this, size.cx, size.cy); }
-  void InflateRect(LPCRECT lpRect) noexcept
-  { left -= lpRect->left; top -= lpRect->top; right += lpRect->right; bottom += lpRect->bottom; }
-  void InflateRect(int l, int t, int r, int b) noexcept
-  { left -= l; top -= t; right += r; bottom += b; }
-  void DeflateRect(int x, int y) noexcept { ::InflateRect(this, -x, -y); }
-  void DeflateRect(SIZE size) noexcept { ::InflateRect(this, -size.cx, -size.cy); }
-  void DeflateRect(LPCRECT lpRect) noexcept
-  { left += lpRect->left; top += lpRect->top; right -= lpRect->right; bottom -= lpRect->bottom; }
-  void DeflateRect(int l, int t, int r, int b) noexcept
-  { left += l; top += t; right -= r; bottom -= b; }
+    void InflateRect(int x, int y) noexcept { ::InflateRect(this, x, y); }
+    void InflateRect(SIZE size) noexcept { ::InflateRect(this, size.cx, size.cy); }
+    void InflateRect(LPCRECT lpRect) noexcept
+    {
+        left -= lpRect->left;
+        top -= lpRect->top;
+        right += lpRect->right;
+        bottom += lpRect->bottom;
+    }
+    void InflateRect(int l, int t, int r, int b) noexcept
+    {
+        left -= l;
+        top -= t;
+        right += r;
+        bottom += b;
+    }
+    void DeflateRect(int x, int y) noexcept { ::InflateRect(this, -x, -y); }
+    void DeflateRect(SIZE size) noexcept { ::InflateRect(this, -size.cx, -size.cy); }
+    void DeflateRect(LPCRECT lpRect) noexcept
+    {
+        left += lpRect->left;
+        top += lpRect->top;
+        right -= lpRect->right;
+        bottom -= lpRect->bottom;
+    }
+    void DeflateRect(int l, int t, int r, int b) noexcept
+    {
+        left += l;
+        top += t;
+        right -= r;
+        bottom -= b;
+    }
 
-  void OffsetRect(int x, int y) noexcept { ::OffsetRect(this, x, y); }
-  void OffsetRect(POINT point) noexcept { ::OffsetRect(this, point.x, point.y); }
-  void OffsetRect(SIZE size) noexcept { ::OffsetRect(this, size.cx, size.cy); }
-  void MoveToXY(int x, int y) noexcept { OffsetRect(x - left, y - top); }
-  void MoveToXY(POINT point) noexcept { MoveToXY(point.x, point.y); }
+    void OffsetRect(int x, int y) noexcept { ::OffsetRect(this, x, y); }
+    void OffsetRect(POINT point) noexcept { ::OffsetRect(this, point.x, point.y); }
+    void OffsetRect(SIZE size) noexcept { ::OffsetRect(this, size.cx, size.cy); }
+    void MoveToXY(int x, int y) noexcept { OffsetRect(x - left, y - top); }
+    void MoveToXY(POINT point) noexcept { MoveToXY(point.x, point.y); }
 
-  void NormalizeRect() noexcept
-  {
-    if (left > right) { const int t = left; left = right; right = t; }
-    if (top > bottom) { const int t = top; top = bottom; bottom = t; }
-  }
-  BOOL IntersectRect(LPCRECT lpRect1, LPCRECT lpRect2) noexcept
-  { return ::IntersectRect(this, lpRect1, lpRect2); }
-  BOOL UnionRect(LPCRECT lpRect1, LPCRECT lpRect2) noexcept
-  { return ::UnionRect(this, lpRect1, lpRect2); }
-  BOOL SubtractRect(LPCRECT lpRectSrc1, LPCRECT lpRectSrc2) noexcept
-  { return ::SubtractRect(this, lpRectSrc1, lpRectSrc2); }
+    void NormalizeRect() noexcept
+    {
+        if (left > right) {
+            const int t = left;
+            left = right;
+            right = t;
+        }
+        if (top > bottom) {
+            const int t = top;
+            top = bottom;
+            bottom = t;
+        }
+    }
+    BOOL IntersectRect(LPCRECT lpRect1, LPCRECT lpRect2) noexcept { return ::IntersectRect(this, lpRect1, lpRect2); }
+    BOOL UnionRect(LPCRECT lpRect1, LPCRECT lpRect2) noexcept { return ::UnionRect(this, lpRect1, lpRect2); }
+    BOOL SubtractRect(LPCRECT lpRectSrc1, LPCRECT lpRectSrc2) noexcept
+    {
+        return ::SubtractRect(this, lpRectSrc1, lpRectSrc2);
+    }
 
-  void operator=(const RECT& srcRect) noexcept { ::CopyRect(this, &srcRect); }
-  BOOL operator==(const RECT& rect) const noexcept { return ::EqualRect(this, &rect); }
-  BOOL operator!=(const RECT& rect) const noexcept { return !::EqualRect(this, &rect); }
-  void operator+=(POINT point) noexcept { OffsetRect(point); }
-  void operator+=(SIZE size) noexcept { OffsetRect(size); }
-  void operator+=(LPCRECT lpRect) noexcept { InflateRect(lpRect); }
-  void operator-=(POINT point) noexcept { OffsetRect(-point.x, -point.y); }
-  void operator-=(SIZE size) noexcept { OffsetRect(-size.cx, -size.cy); }
-  void operator-=(LPCRECT lpRect) noexcept { DeflateRect(lpRect); }
-  void operator&=(const RECT& rect) noexcept { ::IntersectRect(this, this, &rect); }
-  void operator|=(const RECT& rect) noexcept { ::UnionRect(this, this, &rect); }
+    void operator=(const RECT& srcRect) noexcept { ::CopyRect(this, &srcRect); }
+    BOOL operator==(const RECT& rect) const noexcept { return ::EqualRect(this, &rect); }
+    BOOL operator!=(const RECT& rect) const noexcept { return !::EqualRect(this, &rect); }
+    void operator+=(POINT point) noexcept { OffsetRect(point); }
+    void operator+=(SIZE size) noexcept { OffsetRect(size); }
+    void operator+=(LPCRECT lpRect) noexcept { InflateRect(lpRect); }
+    void operator-=(POINT point) noexcept { OffsetRect(-point.x, -point.y); }
+    void operator-=(SIZE size) noexcept { OffsetRect(-size.cx, -size.cy); }
+    void operator-=(LPCRECT lpRect) noexcept { DeflateRect(lpRect); }
+    void operator&=(const RECT& rect) noexcept { ::IntersectRect(this, this, &rect); }
+    void operator|=(const RECT& rect) noexcept { ::UnionRect(this, this, &rect); }
 
-  CRect operator+(POINT point) const noexcept { CRect r(*this); r.OffsetRect(point); return r; }
-  CRect operator-(POINT point) const noexcept { CRect r(*this); r.OffsetRect(-point.x, -point.y); return r; }
-  CRect operator+(SIZE size) const noexcept { CRect r(*this); r.OffsetRect(size); return r; }
-  CRect operator-(SIZE size) const noexcept { CRect r(*this); r.OffsetRect(-size.cx, -size.cy); return r; }
-  CRect operator+(LPCRECT lpRect) const noexcept { CRect r(*this); r.InflateRect(lpRect); return r; }
-  CRect operator-(LPCRECT lpRect) const noexcept { CRect r(*this); r.DeflateRect(lpRect); return r; }
-  CRect operator&(const RECT& rect2) const noexcept { CRect r; ::IntersectRect(&r, this, &rect2); return r; }
-  CRect operator|(const RECT& rect2) const noexcept { CRect r; ::UnionRect(&r, this, &rect2); return r; }
+    CRect operator+(POINT point) const noexcept
+    {
+        CRect r(*this);
+        r.OffsetRect(point);
+        return r;
+    }
+    CRect operator-(POINT point) const noexcept
+    {
+        CRect r(*this);
+        r.OffsetRect(-point.x, -point.y);
+        return r;
+    }
+    CRect operator+(SIZE size) const noexcept
+    {
+        CRect r(*this);
+        r.OffsetRect(size);
+        return r;
+    }
+    CRect operator-(SIZE size) const noexcept
+    {
+        CRect r(*this);
+        r.OffsetRect(-size.cx, -size.cy);
+        return r;
+    }
+    CRect operator+(LPCRECT lpRect) const noexcept
+    {
+        CRect r(*this);
+        r.InflateRect(lpRect);
+        return r;
+    }
+    CRect operator-(LPCRECT lpRect) const noexcept
+    {
+        CRect r(*this);
+        r.DeflateRect(lpRect);
+        return r;
+    }
+    CRect operator&(const RECT& rect2) const noexcept
+    {
+        CRect r;
+        ::IntersectRect(&r, this, &rect2);
+        return r;
+    }
+    CRect operator|(const RECT& rect2) const noexcept
+    {
+        CRect r;
+        ::UnionRect(&r, this, &rect2);
+        return r;
+    }
 };
 
 // ---------------------------------------------------------------------------
@@ -252,113 +400,115 @@ public:
 // ---------------------------------------------------------------------------
 
 // The root of the framework's class tree. Objects are not copyable.
-class AFX_FRAMEWORK_CLASS CObject {
+class AFX_FRAMEWORK_CLASS CObject
+{
 public:
-  virtual ~CObject() = default;
-  CObject(const CObject&) = delete;
-  CObject& operator=(const CObject&) = delete;
+    virtual ~CObject() = default;
+    CObject(const CObject&) = delete;
+    CObject& operator=(const CObject&) = delete;
 
 protected:
-  CObject() = default;
+    CObject() = default;
 };
 
 // ---------------------------------------------------------------------------
 // CString: the framework's 8-bit string
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CString {
+class AFX_FRAMEWORK_CLASS CString
+{
 public:
-  CString() = default;
-  CString(const CString& stringSrc) = default;
-  CString(CString&& stringSrc) noexcept = default;
-  // A null pointer gives the empty string; a resource id made with
-  // MAKEINTRESOURCE loads that string, as the framework's constructor does.
-  CString(LPCSTR lpsz);
-  CString(LPCSTR lpch, int nLength);
-  CString(char ch, int nRepeat = 1);
-  ~CString() = default;
+    CString() = default;
+    CString(const CString& stringSrc) = default;
+    CString(CString&& stringSrc) noexcept = default;
+    // A null pointer gives the empty string; a resource id made with
+    // MAKEINTRESOURCE loads that string, as the framework's constructor does.
+    CString(LPCSTR lpsz);
+    CString(LPCSTR lpch, int nLength);
+    CString(char ch, int nRepeat = 1);
+    ~CString() = default;
 
-  CString& operator=(const CString& stringSrc) = default;
-  CString& operator=(CString&& stringSrc) noexcept = default;
-  CString& operator=(LPCSTR lpsz);
-  CString& operator=(char ch);
+    CString& operator=(const CString& stringSrc) = default;
+    CString& operator=(CString&& stringSrc) noexcept = default;
+    CString& operator=(LPCSTR lpsz);
+    CString& operator=(char ch);
 
-  // Attributes
-  int GetLength() const noexcept { return static_cast<int>(m_text.size()); }
-  BOOL IsEmpty() const noexcept { return m_text.empty(); }
-  void Empty() noexcept { m_text.clear(); }
-  operator LPCSTR() const noexcept { return m_text.c_str(); }
-  LPCSTR GetString() const noexcept { return m_text.c_str(); }
-  // Out-of-range indices give '\0' (GetAt) or are ignored (SetAt).
-  char GetAt(int nIndex) const noexcept;
-  char operator[](int nIndex) const noexcept { return GetAt(nIndex); }
-  void SetAt(int nIndex, char ch) noexcept;
+    // Attributes
+    int GetLength() const noexcept { return static_cast<int>(m_text.size()); }
+    BOOL IsEmpty() const noexcept { return m_text.empty(); }
+    void Empty() noexcept { m_text.clear(); }
+    operator LPCSTR() const noexcept { return m_text.c_str(); }
+    LPCSTR GetString() const noexcept { return m_text.c_str(); }
+    // Out-of-range indices give '\0' (GetAt) or are ignored (SetAt).
+    char GetAt(int nIndex) const noexcept;
+    char operator[](int nIndex) const noexcept { return GetAt(nIndex); }
+    void SetAt(int nIndex, char ch) noexcept;
 
-  // Concatenation
-  CString& operator+=(const CString& string);
-  CString& operator+=(LPCSTR lpsz);
-  CString& operator+=(char ch);
-  void Append(LPCSTR lpsz) { *this += lpsz; }
-  void AppendChar(char ch) { *this += ch; }
-  friend AFX_FRAMEWORK_API CString operator+(const CString& string1, const CString& string2);
-  friend AFX_FRAMEWORK_API CString operator+(const CString& string, LPCSTR lpsz);
-  friend AFX_FRAMEWORK_API CString operator+(LPCSTR lpsz, const CString& string);
-  friend AFX_FRAMEWORK_API CString operator+(const CString& string, char ch);
-  friend AFX_FRAMEWORK_API CString operator+(char ch, const CString& string);
+    // Concatenation
+    CString& operator+=(const CString& string);
+    CString& operator+=(LPCSTR lpsz);
+    CString& operator+=(char ch);
+    void Append(LPCSTR lpsz) { *this += lpsz; }
+    void AppendChar(char ch) { *this += ch; }
+    friend AFX_FRAMEWORK_API CString operator+(const CString& string1, const CString& string2);
+    friend AFX_FRAMEWORK_API CString operator+(const CString& string, LPCSTR lpsz);
+    friend AFX_FRAMEWORK_API CString operator+(LPCSTR lpsz, const CString& string);
+    friend AFX_FRAMEWORK_API CString operator+(const CString& string, char ch);
+    friend AFX_FRAMEWORK_API CString operator+(char ch, const CString& string);
 
-  // Comparison (a null pointer compares as the empty string)
-  int Compare(LPCSTR lpsz) const noexcept;
-  int CompareNoCase(LPCSTR lpsz) const noexcept;
-  friend bool operator==(const CString& s1, const CString& s2) noexcept { return s1.m_text == s2.m_text; }
-  friend bool operator==(const CString& s1, LPCSTR s2) noexcept { return s1.Compare(s2) == 0; }
-  friend bool operator==(LPCSTR s1, const CString& s2) noexcept { return s2.Compare(s1) == 0; }
-  friend bool operator!=(const CString& s1, const CString& s2) noexcept { return !(s1 == s2); }
-  friend bool operator!=(const CString& s1, LPCSTR s2) noexcept { return !(s1 == s2); }
-  friend bool operator!=(LPCSTR s1, const CString& s2) noexcept { return !(s1 == s2); }
-  friend bool operator<(const CString& s1, const CString& s2) noexcept { return s1.m_text < s2.m_text; }
+    // Comparison (a null pointer compares as the empty string)
+    int Compare(LPCSTR lpsz) const noexcept;
+    int CompareNoCase(LPCSTR lpsz) const noexcept;
+    friend bool operator==(const CString& s1, const CString& s2) noexcept { return s1.m_text == s2.m_text; }
+    friend bool operator==(const CString& s1, LPCSTR s2) noexcept { return s1.Compare(s2) == 0; }
+    friend bool operator==(LPCSTR s1, const CString& s2) noexcept { return s2.Compare(s1) == 0; }
+    friend bool operator!=(const CString& s1, const CString& s2) noexcept { return !(s1 == s2); }
+    friend bool operator!=(const CString& s1, LPCSTR s2) noexcept { return !(s1 == s2); }
+    friend bool operator!=(LPCSTR s1, const CString& s2) noexcept { return !(s1 == s2); }
+    friend bool operator<(const CString& s1, const CString& s2) noexcept { return s1.m_text < s2.m_text; }
 
-  // Extraction: counts and positions outside the string are clamped.
-  CString Mid(int nFirst) const;
-  CString Mid(int nFirst, int nCount) const;
-  CString Left(int nCount) const;
-  CString Right(int nCount) const;
+    // Extraction: counts and positions outside the string are clamped.
+    CString Mid(int nFirst) const;
+    CString Mid(int nFirst, int nCount) const;
+    CString Left(int nCount) const;
+    CString Right(int nCount) const;
 
-  // Searching: the zero-based position, or -1.
-  int Find(char ch, int nStart = 0) const noexcept;
-  int Find(LPCSTR lpszSub, int nStart = 0) const noexcept;
-  int ReverseFind(char ch) const noexcept;
+    // Searching: the zero-based position, or -1.
+    int Find(char ch, int nStart = 0) const noexcept;
+    int Find(LPCSTR lpszSub, int nStart = 0) const noexcept;
+    int ReverseFind(char ch) const noexcept;
 
-  // Changing
-  CString& MakeUpper();
-  CString& MakeLower();
-  int Replace(char chOld, char chNew);
-  int Replace(LPCSTR lpszOld, LPCSTR lpszNew);
-  CString& TrimLeft();
-  CString& TrimRight();
-  CString& Trim();
+    // Changing
+    CString& MakeUpper();
+    CString& MakeLower();
+    int Replace(char chOld, char chNew);
+    int Replace(LPCSTR lpszOld, LPCSTR lpszNew);
+    CString& TrimLeft();
+    CString& TrimRight();
+    CString& Trim();
 
-  // printf-style formatting; the result replaces the contents. A CString
-  // argument for %s is passed as (LPCSTR)text: the compiler refuses the
-  // object itself.
-  void AFX_CDECL Format(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
-  void FormatV(LPCSTR lpszFormat, va_list argList);
-  void AFX_CDECL AppendFormat(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
+    // printf-style formatting; the result replaces the contents. A CString
+    // argument for %s is passed as (LPCSTR)text: the compiler refuses the
+    // object itself.
+    void AFX_CDECL Format(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
+    void FormatV(LPCSTR lpszFormat, va_list argList);
+    void AFX_CDECL AppendFormat(LPCSTR lpszFormat, ...) __attribute__((format(gnu_printf, 2, 3)));
 
-  // Loads string nID from the first module of the resource chain that holds
-  // it (AfxFindStringResourceHandle). FALSE, and the string unchanged, when
-  // no module has it.
-  BOOL LoadString(UINT nID);
+    // Loads string nID from the first module of the resource chain that holds
+    // it (AfxFindStringResourceHandle). FALSE, and the string unchanged, when
+    // no module has it.
+    BOOL LoadString(UINT nID);
 
-  // Direct buffer access: the buffer holds at least nMinBufLength characters
-  // plus the terminating zero; ReleaseBuffer(-1) takes the length from the
-  // first zero character, ReleaseBuffer(n) sets it to n.
-  LPSTR GetBuffer(int nMinBufLength);
-  LPSTR GetBuffer() { return GetBuffer(0); }
-  LPSTR GetBufferSetLength(int nNewLength);
-  void ReleaseBuffer(int nNewLength = -1);
+    // Direct buffer access: the buffer holds at least nMinBufLength characters
+    // plus the terminating zero; ReleaseBuffer(-1) takes the length from the
+    // first zero character, ReleaseBuffer(n) sets it to n.
+    LPSTR GetBuffer(int nMinBufLength);
+    LPSTR GetBuffer() { return GetBuffer(0); }
+    LPSTR GetBufferSetLength(int nNewLength);
+    void ReleaseBuffer(int nNewLength = -1);
 
 private:
-  std::string m_text;
+    std::string m_text;
 };
 
 typedef CString CStringA;
@@ -367,29 +517,32 @@ typedef CString CStringA;
 // Exceptions: thrown as pointers, released with Delete()
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CException : public CObject {
+class AFX_FRAMEWORK_CLASS CException : public CObject
+{
 public:
-  explicit CException(BOOL bAutoDelete = TRUE) : m_bAutoDelete(bAutoDelete) {}
-  // Deletes the exception object if it was allocated on the heap by the
-  // thrower (auto-delete), as every framework exception is.
-  void Delete();
-  virtual BOOL GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext = NULL) const;
+    explicit CException(BOOL bAutoDelete = TRUE) : m_bAutoDelete(bAutoDelete) { }
+    // Deletes the exception object if it was allocated on the heap by the
+    // thrower (auto-delete), as every framework exception is.
+    void Delete();
+    virtual BOOL GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext = NULL) const;
 
 protected:
-  BOOL m_bAutoDelete = TRUE;
+    BOOL m_bAutoDelete = TRUE;
 };
 
-class AFX_FRAMEWORK_CLASS CSimpleException : public CException {
+class AFX_FRAMEWORK_CLASS CSimpleException : public CException
+{
 public:
-  explicit CSimpleException(BOOL bAutoDelete = TRUE) : CException(bAutoDelete) {}
+    explicit CSimpleException(BOOL bAutoDelete = TRUE) : CException(bAutoDelete) { }
 };
 
 // Thrown by AfxThrowResourceException: a Windows resource (a window class, a
 // GDI object) could not be created or found.
-class AFX_FRAMEWORK_CLASS CResourceException : public CSimpleException {
+class AFX_FRAMEWORK_CLASS CResourceException : public CSimpleException
+{
 public:
-  CResourceException() : CSimpleException(TRUE) {}
-  BOOL GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext = NULL) const override;
+    CResourceException() : CSimpleException(TRUE) { }
+    BOOL GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext = NULL) const override;
 };
 
 // Throws a heap-allocated CResourceException*; catch it by pointer and call
@@ -405,11 +558,11 @@ class COleObjectFactory;
 
 // Describes one extension library; filled by AfxInitExtensionModule.
 struct AFX_EXTENSION_MODULE {
-  BOOL bInitialized;
-  HMODULE hModule;
-  HMODULE hResource;
-  CRuntimeClass* pFirstSharedClass;
-  COleObjectFactory* pFirstSharedFactory;
+    BOOL bInitialized;
+    HMODULE hModule;
+    HMODULE hResource;
+    CRuntimeClass* pFirstSharedClass;
+    COleObjectFactory* pFirstSharedFactory;
 };
 
 // Fills state for the library hModule (its own resources). A second call for

@@ -16,32 +16,32 @@
 // the dialog there is. The printer DC in m_pPD->m_pd.hDC belongs to the code
 // that asked for it and is not deleted here.
 struct AFX_FRAMEWORK_CLASS CPrintInfo {
-  CPrintInfo();
-  ~CPrintInfo();
-  CPrintInfo(const CPrintInfo&) = delete;
-  CPrintInfo& operator=(const CPrintInfo&) = delete;
+    CPrintInfo();
+    ~CPrintInfo();
+    CPrintInfo(const CPrintInfo&) = delete;
+    CPrintInfo& operator=(const CPrintInfo&) = delete;
 
-  CPrintDialog* m_pPD = NULL;   // owned
-  BOOL m_bDocObject = FALSE;
-  DWORD m_dwFlags = 0;
-  UINT m_nOffsetPage = 0;
-  BOOL m_bDirect = FALSE;       // print without showing the dialog
-  BOOL m_bPreview = FALSE;
-  BOOL m_bContinuePrinting = TRUE;
-  UINT m_nCurPage = 1;
-  UINT m_nNumPreviewPages = 0;
-  CString m_strPageDesc;
-  LPVOID m_lpUserData = NULL;   // not owned
-  CRect m_rectDraw;
-  int m_nJobNumber = 0;
+    CPrintDialog* m_pPD = NULL;  // owned
+    BOOL m_bDocObject = FALSE;
+    DWORD m_dwFlags = 0;
+    UINT m_nOffsetPage = 0;
+    BOOL m_bDirect = FALSE;  // print without showing the dialog
+    BOOL m_bPreview = FALSE;
+    BOOL m_bContinuePrinting = TRUE;
+    UINT m_nCurPage = 1;
+    UINT m_nNumPreviewPages = 0;
+    CString m_strPageDesc;
+    LPVOID m_lpUserData = NULL;  // not owned
+    CRect m_rectDraw;
+    int m_nJobNumber = 0;
 
-  void SetMinPage(UINT nMinPage);
-  void SetMaxPage(UINT nMaxPage);
-  UINT GetMinPage() const;
-  UINT GetMaxPage() const;
-  UINT GetFromPage() const;
-  UINT GetToPage() const;
-  UINT GetOffsetPage() const;
+    void SetMinPage(UINT nMinPage);
+    void SetMaxPage(UINT nMaxPage);
+    UINT GetMinPage() const;
+    UINT GetMaxPage() const;
+    UINT GetFromPage() const;
+    UINT GetToPage() const;
+    UINT GetOffsetPage() const;
 };
 
 #endif  // TAVO_FRAMEWORK_AFXEXT_H

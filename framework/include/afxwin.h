@@ -45,27 +45,27 @@ typedef void (AFX_MSG_CALL CWnd::*AFX_PMSGW)(void);
 // Handler signatures. Each ON_WM_* entry names the signature its handler has,
 // and the window procedure unpacks the message accordingly.
 enum AfxSig : UINT_PTR {
-  AfxSig_end = 0,
-  AfxSig_lwl,         // LRESULT (WPARAM, LPARAM): ON_MESSAGE, ON_REGISTERED_MESSAGE
-  AfxSig_vv,          // void (void)
-  AfxSig_is,          // int (LPCREATESTRUCT)
-  AfxSig_bD,          // BOOL (CDC*)
-  AfxSig_vwii,        // void (UINT, int, int)
-  AfxSig_vii,         // void (int, int)
-  AfxSig_vwwx,        // void (UINT, UINT, CScrollBar*)
-  AfxSig_vt,          // void (UINT_PTR)
-  AfxSig_vwp,         // void (UINT, CPoint)
-  AfxSig_bwsp,        // BOOL (UINT, short, CPoint)
-  AfxSig_vW,          // void (CWnd*)
-  AfxSig_vPOS,        // void (WINDOWPOS*)
-  AfxSig_vwww,        // void (UINT, UINT, UINT)
-  AfxSig_bWww,        // BOOL (CWnd*, UINT, UINT)
-  AfxSig_iWww,        // int (CWnd*, UINT, UINT)
-  AfxSig_vMMI,        // void (MINMAXINFO*)
-  AfxSig_vbw,         // void (BOOL, UINT)
-  AfxSig_lp,          // LRESULT (CPoint)
-  AfxSig_vWp,         // void (CWnd*, CPoint)
-  AfxSig_wv,          // UINT (void)
+    AfxSig_end = 0,
+    AfxSig_lwl,  // LRESULT (WPARAM, LPARAM): ON_MESSAGE, ON_REGISTERED_MESSAGE
+    AfxSig_vv,  // void (void)
+    AfxSig_is,  // int (LPCREATESTRUCT)
+    AfxSig_bD,  // BOOL (CDC*)
+    AfxSig_vwii,  // void (UINT, int, int)
+    AfxSig_vii,  // void (int, int)
+    AfxSig_vwwx,  // void (UINT, UINT, CScrollBar*)
+    AfxSig_vt,  // void (UINT_PTR)
+    AfxSig_vwp,  // void (UINT, CPoint)
+    AfxSig_bwsp,  // BOOL (UINT, short, CPoint)
+    AfxSig_vW,  // void (CWnd*)
+    AfxSig_vPOS,  // void (WINDOWPOS*)
+    AfxSig_vwww,  // void (UINT, UINT, UINT)
+    AfxSig_bWww,  // BOOL (CWnd*, UINT, UINT)
+    AfxSig_iWww,  // int (CWnd*, UINT, UINT)
+    AfxSig_vMMI,  // void (MINMAXINFO*)
+    AfxSig_vbw,  // void (BOOL, UINT)
+    AfxSig_lp,  // LRESULT (CPoint)
+    AfxSig_vWp,  // void (CWnd*, CPoint)
+    AfxSig_wv,  // UINT (void)
 };
 
 // Registered messages are entries with this message code; their nSig holds
@@ -74,60 +74,61 @@ enum AfxSig : UINT_PTR {
 #define AFX_REGISTERED_MESSAGE_CODE 0xC002
 
 struct AFX_MSGMAP_ENTRY {
-  UINT nMessage;   // window message
-  UINT nCode;      // control code or WM_NOTIFY code (unused here)
-  UINT nID;        // control id (unused here)
-  UINT nLastID;    // last control id of a range (unused here)
-  UINT_PTR nSig;   // handler signature, or the address of a registered id
-  AFX_PMSG pfn;    // handler
+    UINT nMessage;  // window message
+    UINT nCode;  // control code or WM_NOTIFY code (unused here)
+    UINT nID;  // control id (unused here)
+    UINT nLastID;  // last control id of a range (unused here)
+    UINT_PTR nSig;  // handler signature, or the address of a registered id
+    AFX_PMSG pfn;  // handler
 };
 
 struct AFX_MSGMAP {
-  const AFX_MSGMAP* (PASCAL* pfnGetBaseMap)();
-  const AFX_MSGMAP_ENTRY* lpEntries;
+    const AFX_MSGMAP*(PASCAL* pfnGetBaseMap)();
+    const AFX_MSGMAP_ENTRY* lpEntries;
 };
 
+// clang-format off
 // Message map entries convert handler pointers between member-function types,
 // which is their purpose; the compiler's warning about it is silenced inside
 // the map only.
 #define PTM_WARNING_DISABLE \
-  _Pragma("GCC diagnostic push") _Pragma("GCC diagnostic ignored \"-Wcast-function-type\"")
+    _Pragma("GCC diagnostic push") _Pragma("GCC diagnostic ignored \"-Wcast-function-type\"")
 #define PTM_WARNING_RESTORE _Pragma("GCC diagnostic pop")
 
 #define DECLARE_MESSAGE_MAP() \
 protected: \
-  static const AFX_MSGMAP* PASCAL GetThisMessageMap(); \
-  const AFX_MSGMAP* GetMessageMap() const override;
+    static const AFX_MSGMAP* PASCAL GetThisMessageMap(); \
+    const AFX_MSGMAP* GetMessageMap() const override;
 
 #define BEGIN_MESSAGE_MAP(theClass, baseClass) \
-  PTM_WARNING_DISABLE \
-  const AFX_MSGMAP* theClass::GetMessageMap() const { return GetThisMessageMap(); } \
-  const AFX_MSGMAP* PASCAL theClass::GetThisMessageMap() \
-  { \
-    typedef theClass ThisClass; \
-    typedef baseClass TheBaseClass; \
-    (void)sizeof(ThisClass*); \
-    static const AFX_MSGMAP_ENTRY _messageEntries[] = {
+    PTM_WARNING_DISABLE \
+    const AFX_MSGMAP* theClass::GetMessageMap() const { return GetThisMessageMap(); } \
+    const AFX_MSGMAP* PASCAL theClass::GetThisMessageMap() \
+    { \
+        typedef theClass ThisClass; \
+        typedef baseClass TheBaseClass; \
+        (void)sizeof(ThisClass*); \
+        static const AFX_MSGMAP_ENTRY _messageEntries[] = {
 
 #define END_MESSAGE_MAP() \
-      {0, 0, 0, 0, AfxSig_end, (AFX_PMSG)0} \
-    }; \
-    static const AFX_MSGMAP messageMap = {&TheBaseClass::GetThisMessageMap, &_messageEntries[0]}; \
-    return &messageMap; \
-  } \
-  PTM_WARNING_RESTORE
+            {0, 0, 0, 0, AfxSig_end, (AFX_PMSG)0} \
+        }; \
+        static const AFX_MSGMAP messageMap = {&TheBaseClass::GetThisMessageMap, &_messageEntries[0]}; \
+        return &messageMap; \
+    } \
+    PTM_WARNING_RESTORE
 
 #define AFX_WM_ENTRY(msg, sig, type, memberFxn) \
-  {msg, 0, 0, 0, sig, (AFX_PMSG)(AFX_PMSGW)(static_cast<type>(memberFxn))},
+    {msg, 0, 0, 0, sig, (AFX_PMSG)(AFX_PMSGW)(static_cast<type>(memberFxn))},
 
 // LRESULT memberFxn(WPARAM, LPARAM)
 #define ON_MESSAGE(message, memberFxn) \
-  AFX_WM_ENTRY(message, AfxSig_lwl, LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM), memberFxn)
+    AFX_WM_ENTRY(message, AfxSig_lwl, LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM), memberFxn)
 // nMessageVariable: a UINT holding a RegisterWindowMessage id; read when a
 // message arrives, so it may be filled after the map is built.
 #define ON_REGISTERED_MESSAGE(nMessageVariable, memberFxn) \
-  {AFX_REGISTERED_MESSAGE_CODE, 0, 0, 0, (UINT_PTR)(UINT*)(&nMessageVariable), \
-   (AFX_PMSG)(AFX_PMSGW)(static_cast<LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM)>(memberFxn))},
+    {AFX_REGISTERED_MESSAGE_CODE, 0, 0, 0, (UINT_PTR)(UINT*)(&nMessageVariable), \
+      (AFX_PMSG)(AFX_PMSGW)(static_cast<LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM)>(memberFxn))},
 
 #define ON_WM_CREATE() AFX_WM_ENTRY(WM_CREATE, AfxSig_is, int (AFX_MSG_CALL CWnd::*)(LPCREATESTRUCT), &ThisClass::OnCreate)
 #define ON_WM_DESTROY() AFX_WM_ENTRY(WM_DESTROY, AfxSig_vv, void (AFX_MSG_CALL CWnd::*)(void), &ThisClass::OnDestroy)
@@ -167,19 +168,21 @@ protected: \
 #define ON_WM_CONTEXTMENU() AFX_WM_ENTRY(WM_CONTEXTMENU, AfxSig_vWp, void (AFX_MSG_CALL CWnd::*)(CWnd*, CPoint), &ThisClass::OnContextMenu)
 #define ON_WM_CANCELMODE() AFX_WM_ENTRY(WM_CANCELMODE, AfxSig_vv, void (AFX_MSG_CALL CWnd::*)(void), &ThisClass::OnCancelMode)
 #define ON_WM_GETDLGCODE() AFX_WM_ENTRY(WM_GETDLGCODE, AfxSig_wv, UINT (AFX_MSG_CALL CWnd::*)(void), &ThisClass::OnGetDlgCode)
+// clang-format on
 
 // ---------------------------------------------------------------------------
 // CCmdTarget: the root of every class with a message map
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CCmdTarget : public CObject {
+class AFX_FRAMEWORK_CLASS CCmdTarget : public CObject
+{
 public:
-  CCmdTarget() = default;
-  ~CCmdTarget() override = default;
+    CCmdTarget() = default;
+    ~CCmdTarget() override = default;
 
 protected:
-  static const AFX_MSGMAP* PASCAL GetThisMessageMap();
-  virtual const AFX_MSGMAP* GetMessageMap() const;
+    static const AFX_MSGMAP* PASCAL GetThisMessageMap();
+    virtual const AFX_MSGMAP* GetMessageMap() const;
 };
 
 // ---------------------------------------------------------------------------
@@ -189,91 +192,119 @@ protected:
 // Owns m_hObject: the destructor and DeleteObject delete it; Detach gives it
 // up. Temporary objects (FromHandle of a handle that no object owns) never
 // delete their handle and are themselves deleted at idle time.
-class AFX_FRAMEWORK_CLASS CGdiObject : public CObject {
+class AFX_FRAMEWORK_CLASS CGdiObject : public CObject
+{
 public:
-  HGDIOBJ m_hObject = NULL;
+    HGDIOBJ m_hObject = NULL;
 
-  CGdiObject() = default;
-  ~CGdiObject() override;
+    CGdiObject() = default;
+    ~CGdiObject() override;
 
-  operator HGDIOBJ() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hObject; }
-  HGDIOBJ GetSafeHandle() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hObject; }
+    operator HGDIOBJ() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hObject;
+    }
+    HGDIOBJ GetSafeHandle() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hObject;
+    }
 
-  // The object attached to hObject, or a temporary one of the matching
-  // class (CPen, CBrush, CFont, CRgn or CGdiObject). NULL for NULL.
-  static CGdiObject* PASCAL FromHandle(HGDIOBJ hObject);
-  static void PASCAL DeleteTempMap();
-  BOOL Attach(HGDIOBJ hObject);
-  HGDIOBJ Detach();
+    // The object attached to hObject, or a temporary one of the matching
+    // class (CPen, CBrush, CFont, CRgn or CGdiObject). NULL for NULL.
+    static CGdiObject* PASCAL FromHandle(HGDIOBJ hObject);
+    static void PASCAL DeleteTempMap();
+    BOOL Attach(HGDIOBJ hObject);
+    HGDIOBJ Detach();
 
-  BOOL DeleteObject();
-  int GetObject(int nCount, LPVOID lpObject) const;
-  UINT GetObjectType() const;
-  BOOL CreateStockObject(int nIndex);
-  BOOL UnrealizeObject();
-  BOOL operator==(const CGdiObject& obj) const { return obj.m_hObject == m_hObject; }
-  BOOL operator!=(const CGdiObject& obj) const { return obj.m_hObject != m_hObject; }
+    BOOL DeleteObject();
+    int GetObject(int nCount, LPVOID lpObject) const;
+    UINT GetObjectType() const;
+    BOOL CreateStockObject(int nIndex);
+    BOOL UnrealizeObject();
+    BOOL operator==(const CGdiObject& obj) const { return obj.m_hObject == m_hObject; }
+    BOOL operator!=(const CGdiObject& obj) const { return obj.m_hObject != m_hObject; }
 };
 
-class AFX_FRAMEWORK_CLASS CPen : public CGdiObject {
+class AFX_FRAMEWORK_CLASS CPen : public CGdiObject
+{
 public:
-  static CPen* PASCAL FromHandle(HPEN hPen);
-  CPen() = default;
-  // Throws CResourceException* when the pen cannot be created.
-  CPen(int nPenStyle, int nWidth, COLORREF crColor);
-  BOOL CreatePen(int nPenStyle, int nWidth, COLORREF crColor);
-  BOOL CreatePenIndirect(LPLOGPEN lpLogPen);
-  operator HPEN() const { const auto* self = AfxNullableThis(this); return (HPEN)(self == NULL ? NULL : self->m_hObject); }
-  int GetLogPen(LOGPEN* pLogPen) const;
+    static CPen* PASCAL FromHandle(HPEN hPen);
+    CPen() = default;
+    // Throws CResourceException* when the pen cannot be created.
+    CPen(int nPenStyle, int nWidth, COLORREF crColor);
+    BOOL CreatePen(int nPenStyle, int nWidth, COLORREF crColor);
+    BOOL CreatePenIndirect(LPLOGPEN lpLogPen);
+    operator HPEN() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return (HPEN)(self == NULL ? NULL : self->m_hObject);
+    }
+    int GetLogPen(LOGPEN* pLogPen) const;
 };
 
-class AFX_FRAMEWORK_CLASS CBrush : public CGdiObject {
+class AFX_FRAMEWORK_CLASS CBrush : public CGdiObject
+{
 public:
-  static CBrush* PASCAL FromHandle(HBRUSH hBrush);
-  CBrush() = default;
-  // Throws CResourceException* when the brush cannot be created.
-  explicit CBrush(COLORREF crColor);
-  BOOL CreateSolidBrush(COLORREF crColor);
-  BOOL CreateHatchBrush(int nIndex, COLORREF crColor);
-  BOOL CreateBrushIndirect(const LOGBRUSH* lpLogBrush);
-  BOOL CreateSysColorBrush(int nIndex);
-  operator HBRUSH() const { const auto* self = AfxNullableThis(this); return (HBRUSH)(self == NULL ? NULL : self->m_hObject); }
-  int GetLogBrush(LOGBRUSH* pLogBrush) const;
+    static CBrush* PASCAL FromHandle(HBRUSH hBrush);
+    CBrush() = default;
+    // Throws CResourceException* when the brush cannot be created.
+    explicit CBrush(COLORREF crColor);
+    BOOL CreateSolidBrush(COLORREF crColor);
+    BOOL CreateHatchBrush(int nIndex, COLORREF crColor);
+    BOOL CreateBrushIndirect(const LOGBRUSH* lpLogBrush);
+    BOOL CreateSysColorBrush(int nIndex);
+    operator HBRUSH() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return (HBRUSH)(self == NULL ? NULL : self->m_hObject);
+    }
+    int GetLogBrush(LOGBRUSH* pLogBrush) const;
 };
 
-class AFX_FRAMEWORK_CLASS CFont : public CGdiObject {
+class AFX_FRAMEWORK_CLASS CFont : public CGdiObject
+{
 public:
-  static CFont* PASCAL FromHandle(HFONT hFont);
-  CFont() = default;
-  BOOL CreateFontIndirect(const LOGFONT* lpLogFont);
-  BOOL CreateFont(int nHeight, int nWidth, int nEscapement, int nOrientation, int nWeight,
-                  BYTE bItalic, BYTE bUnderline, BYTE cStrikeOut, BYTE nCharSet,
-                  BYTE nOutPrecision, BYTE nClipPrecision, BYTE nQuality,
-                  BYTE nPitchAndFamily, LPCTSTR lpszFacename);
-  operator HFONT() const { const auto* self = AfxNullableThis(this); return (HFONT)(self == NULL ? NULL : self->m_hObject); }
-  int GetLogFont(LOGFONT* pLogFont);
+    static CFont* PASCAL FromHandle(HFONT hFont);
+    CFont() = default;
+    BOOL CreateFontIndirect(const LOGFONT* lpLogFont);
+    BOOL CreateFont(int nHeight, int nWidth, int nEscapement, int nOrientation, int nWeight, BYTE bItalic,
+                    BYTE bUnderline, BYTE cStrikeOut, BYTE nCharSet, BYTE nOutPrecision, BYTE nClipPrecision,
+                    BYTE nQuality, BYTE nPitchAndFamily, LPCTSTR lpszFacename);
+    operator HFONT() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return (HFONT)(self == NULL ? NULL : self->m_hObject);
+    }
+    int GetLogFont(LOGFONT* pLogFont);
 };
 
-class AFX_FRAMEWORK_CLASS CRgn : public CGdiObject {
+class AFX_FRAMEWORK_CLASS CRgn : public CGdiObject
+{
 public:
-  static CRgn* PASCAL FromHandle(HRGN hRgn);
-  CRgn() = default;
-  operator HRGN() const { const auto* self = AfxNullableThis(this); return (HRGN)(self == NULL ? NULL : self->m_hObject); }
-  BOOL CreateRectRgn(int x1, int y1, int x2, int y2);
-  BOOL CreateRectRgnIndirect(LPCRECT lpRect);
-  BOOL CreateEllipticRgn(int x1, int y1, int x2, int y2);
-  BOOL CreatePolygonRgn(LPPOINT lpPoints, int nCount, int nMode);
-  void SetRectRgn(int x1, int y1, int x2, int y2);
-  void SetRectRgn(LPCRECT lpRect);
-  int CombineRgn(CRgn* pRgn1, CRgn* pRgn2, int nCombineMode);
-  int CopyRgn(CRgn* pRgnSrc);
-  BOOL EqualRgn(CRgn* pRgn) const;
-  int OffsetRgn(int x, int y);
-  int OffsetRgn(POINT point);
-  int GetRgnBox(LPRECT lpRect) const;
-  BOOL PtInRegion(int x, int y) const;
-  BOOL PtInRegion(POINT point) const;
-  BOOL RectInRegion(LPCRECT lpRect) const;
+    static CRgn* PASCAL FromHandle(HRGN hRgn);
+    CRgn() = default;
+    operator HRGN() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return (HRGN)(self == NULL ? NULL : self->m_hObject);
+    }
+    BOOL CreateRectRgn(int x1, int y1, int x2, int y2);
+    BOOL CreateRectRgnIndirect(LPCRECT lpRect);
+    BOOL CreateEllipticRgn(int x1, int y1, int x2, int y2);
+    BOOL CreatePolygonRgn(LPPOINT lpPoints, int nCount, int nMode);
+    void SetRectRgn(int x1, int y1, int x2, int y2);
+    void SetRectRgn(LPCRECT lpRect);
+    int CombineRgn(CRgn* pRgn1, CRgn* pRgn2, int nCombineMode);
+    int CopyRgn(CRgn* pRgnSrc);
+    BOOL EqualRgn(CRgn* pRgn) const;
+    int OffsetRgn(int x, int y);
+    int OffsetRgn(POINT point);
+    int GetRgnBox(LPRECT lpRect) const;
+    BOOL PtInRegion(int x, int y) const;
+    BOOL PtInRegion(POINT point) const;
+    BOOL RectInRegion(LPCRECT lpRect) const;
 };
 
 // ---------------------------------------------------------------------------
@@ -284,166 +315,177 @@ public:
 // device capabilities, text metrics and text extents, from m_hAttribDC. A CDC
 // that created or attached its DC deletes it in its destructor (DeleteDC);
 // Detach gives the DC up.
-class AFX_FRAMEWORK_CLASS CDC : public CObject {
+class AFX_FRAMEWORK_CLASS CDC : public CObject
+{
 public:
-  HDC m_hDC = NULL;
-  HDC m_hAttribDC = NULL;
-  BOOL m_bPrinting = FALSE;
+    HDC m_hDC = NULL;
+    HDC m_hAttribDC = NULL;
+    BOOL m_bPrinting = FALSE;
 
-  CDC() = default;
-  ~CDC() override;
+    CDC() = default;
+    ~CDC() override;
 
-  operator HDC() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hDC; }
-  HDC GetSafeHdc() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hDC; }
-  CWnd* GetWindow() const;
-  BOOL IsPrinting() const { return m_bPrinting; }
+    operator HDC() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hDC;
+    }
+    HDC GetSafeHdc() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hDC;
+    }
+    CWnd* GetWindow() const;
+    BOOL IsPrinting() const { return m_bPrinting; }
 
-  static CDC* PASCAL FromHandle(HDC hDC);
-  static void PASCAL DeleteTempMap();
-  BOOL Attach(HDC hDC);
-  HDC Detach();
-  virtual void SetAttribDC(HDC hDC);
-  virtual void SetOutputDC(HDC hDC);
-  virtual void ReleaseAttribDC();
-  virtual void ReleaseOutputDC();
+    static CDC* PASCAL FromHandle(HDC hDC);
+    static void PASCAL DeleteTempMap();
+    BOOL Attach(HDC hDC);
+    HDC Detach();
+    virtual void SetAttribDC(HDC hDC);
+    virtual void SetOutputDC(HDC hDC);
+    virtual void ReleaseAttribDC();
+    virtual void ReleaseOutputDC();
 
-  BOOL CreateDC(LPCTSTR lpszDriverName, LPCTSTR lpszDeviceName, LPCTSTR lpszOutput, const void* lpInitData);
-  BOOL CreateIC(LPCTSTR lpszDriverName, LPCTSTR lpszDeviceName, LPCTSTR lpszOutput, const void* lpInitData);
-  BOOL CreateCompatibleDC(CDC* pDC);
-  BOOL DeleteDC();
+    BOOL CreateDC(LPCTSTR lpszDriverName, LPCTSTR lpszDeviceName, LPCTSTR lpszOutput, const void* lpInitData);
+    BOOL CreateIC(LPCTSTR lpszDriverName, LPCTSTR lpszDeviceName, LPCTSTR lpszOutput, const void* lpInitData);
+    BOOL CreateCompatibleDC(CDC* pDC);
+    BOOL DeleteDC();
 
-  virtual int SaveDC();
-  virtual BOOL RestoreDC(int nSavedDC);
-  int GetDeviceCaps(int nIndex) const;
+    virtual int SaveDC();
+    virtual BOOL RestoreDC(int nSavedDC);
+    int GetDeviceCaps(int nIndex) const;
 
-  // Selection: each returns the object that was selected before (a
-  // temporary object when no CGdiObject owns it).
-  CGdiObject* SelectStockObject(int nIndex);
-  CPen* SelectObject(CPen* pPen);
-  CBrush* SelectObject(CBrush* pBrush);
-  virtual CFont* SelectObject(CFont* pFont);
-  CGdiObject* SelectObject(CGdiObject* pObject);
-  int SelectObject(CRgn* pRgn);  // the region type, as SelectClipRgn
-  HGDIOBJ SelectObject(HGDIOBJ hObject);  // not for regions
+    // Selection: each returns the object that was selected before (a
+    // temporary object when no CGdiObject owns it).
+    CGdiObject* SelectStockObject(int nIndex);
+    CPen* SelectObject(CPen* pPen);
+    CBrush* SelectObject(CBrush* pBrush);
+    virtual CFont* SelectObject(CFont* pFont);
+    CGdiObject* SelectObject(CGdiObject* pObject);
+    int SelectObject(CRgn* pRgn);  // the region type, as SelectClipRgn
+    HGDIOBJ SelectObject(HGDIOBJ hObject);  // not for regions
 
-  // Colours and modes
-  COLORREF GetBkColor() const;
-  virtual COLORREF SetBkColor(COLORREF crColor);
-  int GetBkMode() const;
-  int SetBkMode(int nBkMode);
-  int GetPolyFillMode() const;
-  int SetPolyFillMode(int nPolyFillMode);
-  int GetROP2() const;
-  int SetROP2(int nDrawMode);
-  COLORREF GetTextColor() const;
-  virtual COLORREF SetTextColor(COLORREF crColor);
-  UINT GetTextAlign() const;
-  UINT SetTextAlign(UINT nFlags);
+    // Colours and modes
+    COLORREF GetBkColor() const;
+    virtual COLORREF SetBkColor(COLORREF crColor);
+    int GetBkMode() const;
+    int SetBkMode(int nBkMode);
+    int GetPolyFillMode() const;
+    int SetPolyFillMode(int nPolyFillMode);
+    int GetROP2() const;
+    int SetROP2(int nDrawMode);
+    COLORREF GetTextColor() const;
+    virtual COLORREF SetTextColor(COLORREF crColor);
+    UINT GetTextAlign() const;
+    UINT SetTextAlign(UINT nFlags);
 
-  // Mapping
-  int GetMapMode() const;
-  virtual int SetMapMode(int nMapMode);
-  CPoint GetViewportOrg() const;
-  virtual CPoint SetViewportOrg(int x, int y);
-  CPoint SetViewportOrg(POINT point);
-  virtual CPoint OffsetViewportOrg(int nWidth, int nHeight);
-  CSize GetViewportExt() const;
-  virtual CSize SetViewportExt(int cx, int cy);
-  CSize SetViewportExt(SIZE size);
-  CPoint GetWindowOrg() const;
-  CPoint SetWindowOrg(int x, int y);
-  CPoint SetWindowOrg(POINT point);
-  CSize GetWindowExt() const;
-  virtual CSize SetWindowExt(int cx, int cy);
-  CSize SetWindowExt(SIZE size);
-  void DPtoLP(LPPOINT lpPoints, int nCount = 1) const;
-  void DPtoLP(LPRECT lpRect) const;
-  void LPtoDP(LPPOINT lpPoints, int nCount = 1) const;
-  void LPtoDP(LPRECT lpRect) const;
+    // Mapping
+    int GetMapMode() const;
+    virtual int SetMapMode(int nMapMode);
+    CPoint GetViewportOrg() const;
+    virtual CPoint SetViewportOrg(int x, int y);
+    CPoint SetViewportOrg(POINT point);
+    virtual CPoint OffsetViewportOrg(int nWidth, int nHeight);
+    CSize GetViewportExt() const;
+    virtual CSize SetViewportExt(int cx, int cy);
+    CSize SetViewportExt(SIZE size);
+    CPoint GetWindowOrg() const;
+    CPoint SetWindowOrg(int x, int y);
+    CPoint SetWindowOrg(POINT point);
+    CSize GetWindowExt() const;
+    virtual CSize SetWindowExt(int cx, int cy);
+    CSize SetWindowExt(SIZE size);
+    void DPtoLP(LPPOINT lpPoints, int nCount = 1) const;
+    void DPtoLP(LPRECT lpRect) const;
+    void LPtoDP(LPPOINT lpPoints, int nCount = 1) const;
+    void LPtoDP(LPRECT lpRect) const;
 
-  // Clipping
-  virtual int GetClipBox(LPRECT lpRect) const;
-  BOOL PtVisible(int x, int y) const;
-  BOOL RectVisible(LPCRECT lpRect) const;
-  int SelectClipRgn(CRgn* pRgn);
-  int SelectClipRgn(CRgn* pRgn, int nMode);
-  int ExcludeClipRect(int x1, int y1, int x2, int y2);
-  int ExcludeClipRect(LPCRECT lpRect);
-  int IntersectClipRect(int x1, int y1, int x2, int y2);
-  int IntersectClipRect(LPCRECT lpRect);
-  int OffsetClipRgn(int x, int y);
+    // Clipping
+    virtual int GetClipBox(LPRECT lpRect) const;
+    BOOL PtVisible(int x, int y) const;
+    BOOL RectVisible(LPCRECT lpRect) const;
+    int SelectClipRgn(CRgn* pRgn);
+    int SelectClipRgn(CRgn* pRgn, int nMode);
+    int ExcludeClipRect(int x1, int y1, int x2, int y2);
+    int ExcludeClipRect(LPCRECT lpRect);
+    int IntersectClipRect(int x1, int y1, int x2, int y2);
+    int IntersectClipRect(LPCRECT lpRect);
+    int OffsetClipRgn(int x, int y);
 
-  // Lines
-  CPoint GetCurrentPosition() const;
-  CPoint MoveTo(int x, int y);
-  CPoint MoveTo(POINT point);
-  BOOL LineTo(int x, int y);
-  BOOL LineTo(POINT point);
-  BOOL Polyline(const POINT* lpPoints, int nCount);
-  BOOL PolyPolyline(const POINT* lpPoints, const DWORD* lpPolyPoints, int nCount);
+    // Lines
+    CPoint GetCurrentPosition() const;
+    CPoint MoveTo(int x, int y);
+    CPoint MoveTo(POINT point);
+    BOOL LineTo(int x, int y);
+    BOOL LineTo(POINT point);
+    BOOL Polyline(const POINT* lpPoints, int nCount);
+    BOOL PolyPolyline(const POINT* lpPoints, const DWORD* lpPolyPoints, int nCount);
 
-  // Shapes and fills
-  void FillRect(LPCRECT lpRect, CBrush* pBrush);
-  void FrameRect(LPCRECT lpRect, CBrush* pBrush);
-  void InvertRect(LPCRECT lpRect);
-  void DrawFocusRect(LPCRECT lpRect);
-  void FillSolidRect(LPCRECT lpRect, COLORREF clr);
-  void FillSolidRect(int x, int y, int cx, int cy, COLORREF clr);
-  BOOL FillRgn(CRgn* pRgn, CBrush* pBrush);
-  BOOL Rectangle(int x1, int y1, int x2, int y2);
-  BOOL Rectangle(LPCRECT lpRect);
-  BOOL Ellipse(int x1, int y1, int x2, int y2);
-  BOOL Ellipse(LPCRECT lpRect);
-  BOOL Polygon(const POINT* lpPoints, int nCount);
-  BOOL PolyPolygon(const POINT* lpPoints, const INT* lpPolyCounts, int nCount);
-  BOOL PatBlt(int x, int y, int nWidth, int nHeight, DWORD dwRop);
-  BOOL BitBlt(int x, int y, int nWidth, int nHeight, CDC* pSrcDC, int xSrc, int ySrc, DWORD dwRop);
-  COLORREF SetPixel(int x, int y, COLORREF crColor);
-  COLORREF GetPixel(int x, int y) const;
+    // Shapes and fills
+    void FillRect(LPCRECT lpRect, CBrush* pBrush);
+    void FrameRect(LPCRECT lpRect, CBrush* pBrush);
+    void InvertRect(LPCRECT lpRect);
+    void DrawFocusRect(LPCRECT lpRect);
+    void FillSolidRect(LPCRECT lpRect, COLORREF clr);
+    void FillSolidRect(int x, int y, int cx, int cy, COLORREF clr);
+    BOOL FillRgn(CRgn* pRgn, CBrush* pBrush);
+    BOOL Rectangle(int x1, int y1, int x2, int y2);
+    BOOL Rectangle(LPCRECT lpRect);
+    BOOL Ellipse(int x1, int y1, int x2, int y2);
+    BOOL Ellipse(LPCRECT lpRect);
+    BOOL Polygon(const POINT* lpPoints, int nCount);
+    BOOL PolyPolygon(const POINT* lpPoints, const INT* lpPolyCounts, int nCount);
+    BOOL PatBlt(int x, int y, int nWidth, int nHeight, DWORD dwRop);
+    BOOL BitBlt(int x, int y, int nWidth, int nHeight, CDC* pSrcDC, int xSrc, int ySrc, DWORD dwRop);
+    COLORREF SetPixel(int x, int y, COLORREF crColor);
+    COLORREF GetPixel(int x, int y) const;
 
-  // Text
-  virtual BOOL TextOut(int x, int y, LPCTSTR lpszString, int nCount);
-  BOOL TextOut(int x, int y, const CString& str);
-  virtual BOOL ExtTextOut(int x, int y, UINT nOptions, LPCRECT lpRect, LPCTSTR lpszString,
-                          UINT nCount, LPINT lpDxWidths);
-  virtual int DrawText(LPCTSTR lpszString, int nCount, LPRECT lpRect, UINT nFormat);
-  int DrawText(const CString& str, LPRECT lpRect, UINT nFormat);
-  CSize GetTextExtent(LPCTSTR lpszString, int nCount) const;
-  CSize GetTextExtent(const CString& str) const;
-  CSize GetOutputTextExtent(LPCTSTR lpszString, int nCount) const;
-  BOOL GetTextMetrics(LPTEXTMETRIC lpMetrics) const;
-  BOOL GetOutputTextMetrics(LPTEXTMETRIC lpMetrics) const;
+    // Text
+    virtual BOOL TextOut(int x, int y, LPCTSTR lpszString, int nCount);
+    BOOL TextOut(int x, int y, const CString& str);
+    virtual BOOL ExtTextOut(int x, int y, UINT nOptions, LPCRECT lpRect, LPCTSTR lpszString, UINT nCount,
+                            LPINT lpDxWidths);
+    virtual int DrawText(LPCTSTR lpszString, int nCount, LPRECT lpRect, UINT nFormat);
+    int DrawText(const CString& str, LPRECT lpRect, UINT nFormat);
+    CSize GetTextExtent(LPCTSTR lpszString, int nCount) const;
+    CSize GetTextExtent(const CString& str) const;
+    CSize GetOutputTextExtent(LPCTSTR lpszString, int nCount) const;
+    BOOL GetTextMetrics(LPTEXTMETRIC lpMetrics) const;
+    BOOL GetOutputTextMetrics(LPTEXTMETRIC lpMetrics) const;
 
-  // Printing
-  int StartDoc(LPDOCINFO lpDocInfo);
-  int StartPage();
-  int EndPage();
-  int EndDoc();
-  int AbortDoc();
-  int SetAbortProc(BOOL(CALLBACK* lpfn)(HDC, int));
+    // Printing
+    int StartDoc(LPDOCINFO lpDocInfo);
+    int StartPage();
+    int EndPage();
+    int EndDoc();
+    int AbortDoc();
+    int SetAbortProc(BOOL(CALLBACK* lpfn)(HDC, int));
 };
 
 // BeginPaint on construction, EndPaint on destruction.
-class AFX_FRAMEWORK_CLASS CPaintDC : public CDC {
+class AFX_FRAMEWORK_CLASS CPaintDC : public CDC
+{
 public:
-  PAINTSTRUCT m_ps = {};
+    PAINTSTRUCT m_ps = {};
 
-  explicit CPaintDC(CWnd* pWnd);  // throws CResourceException* if BeginPaint fails
-  ~CPaintDC() override;
+    explicit CPaintDC(CWnd* pWnd);  // throws CResourceException* if BeginPaint fails
+    ~CPaintDC() override;
 
 protected:
-  HWND m_hWnd = NULL;
+    HWND m_hWnd = NULL;
 };
 
 // GetDC on construction, ReleaseDC on destruction; a NULL window gives the
 // screen's DC.
-class AFX_FRAMEWORK_CLASS CClientDC : public CDC {
+class AFX_FRAMEWORK_CLASS CClientDC : public CDC
+{
 public:
-  explicit CClientDC(CWnd* pWnd);  // throws CResourceException* if GetDC fails
-  ~CClientDC() override;
+    explicit CClientDC(CWnd* pWnd);  // throws CResourceException* if GetDC fails
+    ~CClientDC() override;
 
 protected:
-  HWND m_hWnd = NULL;
+    HWND m_hWnd = NULL;
 };
 
 // ---------------------------------------------------------------------------
@@ -456,204 +498,209 @@ protected:
 // object is detached when the window is destroyed (WM_NCDESTROY), after
 // which PostNcDestroy runs. Destroying an object whose window still exists
 // destroys the window.
-class AFX_FRAMEWORK_CLASS CWnd : public CCmdTarget {
+class AFX_FRAMEWORK_CLASS CWnd : public CCmdTarget
+{
 public:
-  HWND m_hWnd = NULL;
+    HWND m_hWnd = NULL;
 
-  // SetWindowPos insert-after markers (HWND_TOP, HWND_BOTTOM, ...).
-  static const CWnd wndTop;
-  static const CWnd wndBottom;
-  static const CWnd wndTopMost;
-  static const CWnd wndNoTopMost;
+    // SetWindowPos insert-after markers (HWND_TOP, HWND_BOTTOM, ...).
+    static const CWnd wndTop;
+    static const CWnd wndBottom;
+    static const CWnd wndTopMost;
+    static const CWnd wndNoTopMost;
 
-  CWnd() = default;
-  ~CWnd() override;
+    CWnd() = default;
+    ~CWnd() override;
 
-  HWND GetSafeHwnd() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hWnd; }
-  operator HWND() const { const auto* self = AfxNullableThis(this); return self == NULL ? NULL : self->m_hWnd; }
-  BOOL operator==(const CWnd& wnd) const { return wnd.m_hWnd == m_hWnd; }
-  BOOL operator!=(const CWnd& wnd) const { return wnd.m_hWnd != m_hWnd; }
+    HWND GetSafeHwnd() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hWnd;
+    }
+    operator HWND() const
+    {
+        const auto* self = AfxNullableThis(this);
+        return self == NULL ? NULL : self->m_hWnd;
+    }
+    BOOL operator==(const CWnd& wnd) const { return wnd.m_hWnd == m_hWnd; }
+    BOOL operator!=(const CWnd& wnd) const { return wnd.m_hWnd != m_hWnd; }
 
-  // Handle maps
-  static CWnd* PASCAL FromHandle(HWND hWnd);
-  static CWnd* PASCAL FromHandlePermanent(HWND hWnd);
-  static void PASCAL DeleteTempMap();
-  BOOL Attach(HWND hWndNew);
-  HWND Detach();
-  BOOL SubclassWindow(HWND hWnd);
-  BOOL SubclassDlgItem(UINT nID, CWnd* pParent);
-  HWND UnsubclassWindow();
+    // Handle maps
+    static CWnd* PASCAL FromHandle(HWND hWnd);
+    static CWnd* PASCAL FromHandlePermanent(HWND hWnd);
+    static void PASCAL DeleteTempMap();
+    BOOL Attach(HWND hWndNew);
+    HWND Detach();
+    BOOL SubclassWindow(HWND hWnd);
+    BOOL SubclassDlgItem(UINT nID, CWnd* pParent);
+    HWND UnsubclassWindow();
 
-  // Creation and destruction. Create adds WS_CHILD; a NULL class name uses
-  // the framework's default window class. FALSE when the object already has
-  // a window or the window cannot be created.
-  virtual BOOL Create(LPCTSTR lpszClassName, LPCTSTR lpszWindowName, DWORD dwStyle,
-                      const RECT& rect, CWnd* pParentWnd, UINT nID,
-                      CCreateContext* pContext = NULL);
-  virtual BOOL CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowName,
-                        DWORD dwStyle, int x, int y, int nWidth, int nHeight,
-                        HWND hWndParent, HMENU nIDorHMenu, LPVOID lpParam = NULL);
-  virtual BOOL CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowName,
-                        DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID,
-                        LPVOID lpParam = NULL);
-  virtual BOOL DestroyWindow();
+    // Creation and destruction. Create adds WS_CHILD; a NULL class name uses
+    // the framework's default window class. FALSE when the object already has
+    // a window or the window cannot be created.
+    virtual BOOL Create(LPCTSTR lpszClassName, LPCTSTR lpszWindowName, DWORD dwStyle, const RECT& rect,
+                        CWnd* pParentWnd, UINT nID, CCreateContext* pContext = NULL);
+    virtual BOOL CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowName, DWORD dwStyle, int x, int y,
+                          int nWidth, int nHeight, HWND hWndParent, HMENU nIDorHMenu, LPVOID lpParam = NULL);
+    virtual BOOL CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowName, DWORD dwStyle,
+                          const RECT& rect, CWnd* pParentWnd, UINT nID, LPVOID lpParam = NULL);
+    virtual BOOL DestroyWindow();
 
-  // Styles and identity
-  DWORD GetStyle() const;
-  DWORD GetExStyle() const;
-  BOOL ModifyStyle(DWORD dwRemove, DWORD dwAdd, UINT nFlags = 0);
-  BOOL ModifyStyleEx(DWORD dwRemove, DWORD dwAdd, UINT nFlags = 0);
-  int GetDlgCtrlID() const;
-  int SetDlgCtrlID(int nID);
-  CWnd* GetOwner() const;
-  void SetOwner(CWnd* pOwnerWnd);
+    // Styles and identity
+    DWORD GetStyle() const;
+    DWORD GetExStyle() const;
+    BOOL ModifyStyle(DWORD dwRemove, DWORD dwAdd, UINT nFlags = 0);
+    BOOL ModifyStyleEx(DWORD dwRemove, DWORD dwAdd, UINT nFlags = 0);
+    int GetDlgCtrlID() const;
+    int SetDlgCtrlID(int nID);
+    CWnd* GetOwner() const;
+    void SetOwner(CWnd* pOwnerWnd);
 
-  // Window tree
-  CWnd* GetParent() const;
-  CWnd* SetParent(CWnd* pWndNewParent);
-  CWnd* GetTopLevelParent() const;
-  BOOL IsChild(const CWnd* pWnd) const;
-  CWnd* GetDlgItem(int nID) const;
-  void GetDlgItem(int nID, HWND* phWnd) const;
-  static CWnd* PASCAL GetActiveWindow();
-  CWnd* SetActiveWindow();
-  static CWnd* PASCAL GetFocus();
-  CWnd* SetFocus();
-  static CWnd* PASCAL GetCapture();
-  CWnd* SetCapture();
-  static CWnd* PASCAL WindowFromPoint(POINT point);
+    // Window tree
+    CWnd* GetParent() const;
+    CWnd* SetParent(CWnd* pWndNewParent);
+    CWnd* GetTopLevelParent() const;
+    BOOL IsChild(const CWnd* pWnd) const;
+    CWnd* GetDlgItem(int nID) const;
+    void GetDlgItem(int nID, HWND* phWnd) const;
+    static CWnd* PASCAL GetActiveWindow();
+    CWnd* SetActiveWindow();
+    static CWnd* PASCAL GetFocus();
+    CWnd* SetFocus();
+    static CWnd* PASCAL GetCapture();
+    CWnd* SetCapture();
+    static CWnd* PASCAL WindowFromPoint(POINT point);
 
-  // Size and position
-  void GetWindowRect(LPRECT lpRect) const;
-  void GetClientRect(LPRECT lpRect) const;
-  void ClientToScreen(LPPOINT lpPoint) const;
-  void ClientToScreen(LPRECT lpRect) const;
-  void ScreenToClient(LPPOINT lpPoint) const;
-  void ScreenToClient(LPRECT lpRect) const;
-  void MapWindowPoints(CWnd* pwndTo, LPPOINT lpPoint, UINT nCount) const;
-  void MapWindowPoints(CWnd* pwndTo, LPRECT lpRect) const;
-  void MoveWindow(int x, int y, int nWidth, int nHeight, BOOL bRepaint = TRUE);
-  void MoveWindow(LPCRECT lpRect, BOOL bRepaint = TRUE);
-  BOOL SetWindowPos(const CWnd* pWndInsertAfter, int x, int y, int cx, int cy, UINT nFlags);
-  BOOL ShowWindow(int nCmdShow);
-  BOOL IsWindowVisible() const;
-  BOOL IsWindowEnabled() const;
-  BOOL EnableWindow(BOOL bEnable = TRUE);
-  void BringWindowToTop();
+    // Size and position
+    void GetWindowRect(LPRECT lpRect) const;
+    void GetClientRect(LPRECT lpRect) const;
+    void ClientToScreen(LPPOINT lpPoint) const;
+    void ClientToScreen(LPRECT lpRect) const;
+    void ScreenToClient(LPPOINT lpPoint) const;
+    void ScreenToClient(LPRECT lpRect) const;
+    void MapWindowPoints(CWnd* pwndTo, LPPOINT lpPoint, UINT nCount) const;
+    void MapWindowPoints(CWnd* pwndTo, LPRECT lpRect) const;
+    void MoveWindow(int x, int y, int nWidth, int nHeight, BOOL bRepaint = TRUE);
+    void MoveWindow(LPCRECT lpRect, BOOL bRepaint = TRUE);
+    BOOL SetWindowPos(const CWnd* pWndInsertAfter, int x, int y, int cx, int cy, UINT nFlags);
+    BOOL ShowWindow(int nCmdShow);
+    BOOL IsWindowVisible() const;
+    BOOL IsWindowEnabled() const;
+    BOOL EnableWindow(BOOL bEnable = TRUE);
+    void BringWindowToTop();
 
-  // Text
-  void SetWindowText(LPCTSTR lpszString);
-  int GetWindowText(LPTSTR lpszStringBuf, int nMaxCount) const;
-  void GetWindowText(CString& rString) const;
-  int GetWindowTextLength() const;
-  void SetDlgItemText(int nID, LPCTSTR lpszString);
-  int GetDlgItemText(int nID, CString& rString) const;
-  void SetFont(CFont* pFont, BOOL bRedraw = TRUE);
-  CFont* GetFont() const;
+    // Text
+    void SetWindowText(LPCTSTR lpszString);
+    int GetWindowText(LPTSTR lpszStringBuf, int nMaxCount) const;
+    void GetWindowText(CString& rString) const;
+    int GetWindowTextLength() const;
+    void SetDlgItemText(int nID, LPCTSTR lpszString);
+    int GetDlgItemText(int nID, CString& rString) const;
+    void SetFont(CFont* pFont, BOOL bRedraw = TRUE);
+    CFont* GetFont() const;
 
-  // Buttons of a dialog
-  void CheckRadioButton(int nIDFirstButton, int nIDLastButton, int nIDCheckButton);
-  void CheckDlgButton(int nIDButton, UINT nCheck);
-  UINT IsDlgButtonChecked(int nIDButton) const;
+    // Buttons of a dialog
+    void CheckRadioButton(int nIDFirstButton, int nIDLastButton, int nIDCheckButton);
+    void CheckDlgButton(int nIDButton, UINT nCheck);
+    UINT IsDlgButtonChecked(int nIDButton) const;
 
-  // Messages and timers
-  LRESULT SendMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
-  BOOL PostMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
-  UINT_PTR SetTimer(UINT_PTR nIDEvent, UINT nElapse,
-                    void(CALLBACK* lpfnTimer)(HWND, UINT, UINT_PTR, DWORD));
-  BOOL KillTimer(UINT_PTR nIDEvent);
+    // Messages and timers
+    LRESULT SendMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
+    BOOL PostMessage(UINT message, WPARAM wParam = 0, LPARAM lParam = 0);
+    UINT_PTR SetTimer(UINT_PTR nIDEvent, UINT nElapse, void(CALLBACK* lpfnTimer)(HWND, UINT, UINT_PTR, DWORD));
+    BOOL KillTimer(UINT_PTR nIDEvent);
 
-  // Painting
-  CDC* GetDC();
-  CDC* GetWindowDC();
-  int ReleaseDC(CDC* pDC);
-  CDC* BeginPaint(LPPAINTSTRUCT lpPaint);
-  void EndPaint(LPPAINTSTRUCT lpPaint);
-  void Invalidate(BOOL bErase = TRUE);
-  void InvalidateRect(LPCRECT lpRect, BOOL bErase = TRUE);
-  void InvalidateRgn(CRgn* pRgn, BOOL bErase = TRUE);
-  void ValidateRect(LPCRECT lpRect);
-  void UpdateWindow();
-  BOOL RedrawWindow(LPCRECT lpRectUpdate = NULL, CRgn* prgnUpdate = NULL,
-                    UINT flags = RDW_INVALIDATE | RDW_UPDATENOW | RDW_ERASE);
+    // Painting
+    CDC* GetDC();
+    CDC* GetWindowDC();
+    int ReleaseDC(CDC* pDC);
+    CDC* BeginPaint(LPPAINTSTRUCT lpPaint);
+    void EndPaint(LPPAINTSTRUCT lpPaint);
+    void Invalidate(BOOL bErase = TRUE);
+    void InvalidateRect(LPCRECT lpRect, BOOL bErase = TRUE);
+    void InvalidateRgn(CRgn* pRgn, BOOL bErase = TRUE);
+    void ValidateRect(LPCRECT lpRect);
+    void UpdateWindow();
+    BOOL RedrawWindow(LPCRECT lpRectUpdate = NULL, CRgn* prgnUpdate = NULL,
+                      UINT flags = RDW_INVALIDATE | RDW_UPDATENOW | RDW_ERASE);
 
-  // Scrolling
-  void ScrollWindow(int xAmount, int yAmount, LPCRECT lpRect = NULL, LPCRECT lpClipRect = NULL);
-  int ScrollWindowEx(int dx, int dy, LPCRECT lpRectScroll, LPCRECT lpRectClip,
-                     CRgn* prgnUpdate, LPRECT lpRectUpdate, UINT flags);
-  int SetScrollPos(int nBar, int nPos, BOOL bRedraw = TRUE);
-  int GetScrollPos(int nBar) const;
-  void SetScrollRange(int nBar, int nMinPos, int nMaxPos, BOOL bRedraw = TRUE);
-  void GetScrollRange(int nBar, LPINT lpMinPos, LPINT lpMaxPos) const;
-  BOOL SetScrollInfo(int nBar, LPSCROLLINFO lpScrollInfo, BOOL bRedraw = TRUE);
-  BOOL GetScrollInfo(int nBar, LPSCROLLINFO lpScrollInfo, UINT nMask = SIF_ALL);
-  void ShowScrollBar(UINT nBar, BOOL bShow = TRUE);
+    // Scrolling
+    void ScrollWindow(int xAmount, int yAmount, LPCRECT lpRect = NULL, LPCRECT lpClipRect = NULL);
+    int ScrollWindowEx(int dx, int dy, LPCRECT lpRectScroll, LPCRECT lpRectClip, CRgn* prgnUpdate, LPRECT lpRectUpdate,
+                       UINT flags);
+    int SetScrollPos(int nBar, int nPos, BOOL bRedraw = TRUE);
+    int GetScrollPos(int nBar) const;
+    void SetScrollRange(int nBar, int nMinPos, int nMaxPos, BOOL bRedraw = TRUE);
+    void GetScrollRange(int nBar, LPINT lpMinPos, LPINT lpMaxPos) const;
+    BOOL SetScrollInfo(int nBar, LPSCROLLINFO lpScrollInfo, BOOL bRedraw = TRUE);
+    BOOL GetScrollInfo(int nBar, LPSCROLLINFO lpScrollInfo, UINT nMask = SIF_ALL);
+    void ShowScrollBar(UINT nBar, BOOL bShow = TRUE);
 
-  // Overridables
-  virtual BOOL PreCreateWindow(CREATESTRUCT& cs);
-  virtual void PreSubclassWindow();
-  virtual BOOL PreTranslateMessage(MSG* pMsg);
-  // Offers pMsg to PreTranslateMessage of the object of pMsg->hwnd, then of
-  // each parent in turn, stopping at hWndStop or at the first that returns
-  // TRUE (then TRUE is returned).
-  static BOOL PASCAL WalkPreTranslateTree(HWND hWndStop, MSG* pMsg);
+    // Overridables
+    virtual BOOL PreCreateWindow(CREATESTRUCT& cs);
+    virtual void PreSubclassWindow();
+    virtual BOOL PreTranslateMessage(MSG* pMsg);
+    // Offers pMsg to PreTranslateMessage of the object of pMsg->hwnd, then of
+    // each parent in turn, stopping at hWndStop or at the first that returns
+    // TRUE (then TRUE is returned).
+    static BOOL PASCAL WalkPreTranslateTree(HWND hWndStop, MSG* pMsg);
 
-  // The message map dispatch; DefWindowProc calls the window procedure the
-  // window had before it was subclassed (or ::DefWindowProc).
-  virtual LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam);
-  virtual BOOL OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* pResult);
-  virtual LRESULT DefWindowProc(UINT message, WPARAM wParam, LPARAM lParam);
-  virtual void PostNcDestroy();
-  virtual WNDPROC* GetSuperWndProcAddr();
-  // The default processing of the message being handled.
-  LRESULT Default();
+    // The message map dispatch; DefWindowProc calls the window procedure the
+    // window had before it was subclassed (or ::DefWindowProc).
+    virtual LRESULT WindowProc(UINT message, WPARAM wParam, LPARAM lParam);
+    virtual BOOL OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* pResult);
+    virtual LRESULT DefWindowProc(UINT message, WPARAM wParam, LPARAM lParam);
+    virtual void PostNcDestroy();
+    virtual WNDPROC* GetSuperWndProcAddr();
+    // The default processing of the message being handled.
+    LRESULT Default();
 
 protected:
-  explicit CWnd(HWND hWnd) : m_hWnd(hWnd) {}
+    explicit CWnd(HWND hWnd) : m_hWnd(hWnd) { }
 
-  // Default handlers: each passes the current message to Default().
-  afx_msg int OnCreate(LPCREATESTRUCT lpCreateStruct);
-  afx_msg void OnDestroy();
-  afx_msg void OnNcDestroy();
-  afx_msg void OnClose();
-  afx_msg void OnPaint();
-  afx_msg BOOL OnEraseBkgnd(CDC* pDC);
-  afx_msg void OnSize(UINT nType, int cx, int cy);
-  afx_msg void OnMove(int x, int y);
-  afx_msg void OnHScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar);
-  afx_msg void OnVScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar);
-  afx_msg void OnTimer(UINT_PTR nIDEvent);
-  afx_msg void OnMouseMove(UINT nFlags, CPoint point);
-  afx_msg void OnLButtonDown(UINT nFlags, CPoint point);
-  afx_msg void OnLButtonUp(UINT nFlags, CPoint point);
-  afx_msg void OnLButtonDblClk(UINT nFlags, CPoint point);
-  afx_msg void OnRButtonDown(UINT nFlags, CPoint point);
-  afx_msg void OnRButtonUp(UINT nFlags, CPoint point);
-  afx_msg void OnRButtonDblClk(UINT nFlags, CPoint point);
-  afx_msg void OnMButtonDown(UINT nFlags, CPoint point);
-  afx_msg void OnMButtonUp(UINT nFlags, CPoint point);
-  afx_msg void OnMButtonDblClk(UINT nFlags, CPoint point);
-  afx_msg BOOL OnMouseWheel(UINT nFlags, short zDelta, CPoint pt);
-  afx_msg void OnCaptureChanged(CWnd* pWnd);
-  afx_msg void OnSetFocus(CWnd* pOldWnd);
-  afx_msg void OnKillFocus(CWnd* pNewWnd);
-  afx_msg void OnWindowPosChanged(WINDOWPOS* lpwndpos);
-  afx_msg void OnWindowPosChanging(WINDOWPOS* lpwndpos);
-  afx_msg void OnKeyDown(UINT nChar, UINT nRepCnt, UINT nFlags);
-  afx_msg void OnKeyUp(UINT nChar, UINT nRepCnt, UINT nFlags);
-  afx_msg void OnChar(UINT nChar, UINT nRepCnt, UINT nFlags);
-  afx_msg BOOL OnSetCursor(CWnd* pWnd, UINT nHitTest, UINT message);
-  afx_msg int OnMouseActivate(CWnd* pDesktopWnd, UINT nHitTest, UINT message);
-  afx_msg void OnGetMinMaxInfo(MINMAXINFO* lpMMI);
-  afx_msg void OnShowWindow(BOOL bShow, UINT nStatus);
-  afx_msg LRESULT OnNcHitTest(CPoint point);
-  afx_msg void OnContextMenu(CWnd* pWnd, CPoint pos);
-  afx_msg void OnCancelMode();
-  afx_msg UINT OnGetDlgCode();
+    // Default handlers: each passes the current message to Default().
+    afx_msg int OnCreate(LPCREATESTRUCT lpCreateStruct);
+    afx_msg void OnDestroy();
+    afx_msg void OnNcDestroy();
+    afx_msg void OnClose();
+    afx_msg void OnPaint();
+    afx_msg BOOL OnEraseBkgnd(CDC* pDC);
+    afx_msg void OnSize(UINT nType, int cx, int cy);
+    afx_msg void OnMove(int x, int y);
+    afx_msg void OnHScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar);
+    afx_msg void OnVScroll(UINT nSBCode, UINT nPos, CScrollBar* pScrollBar);
+    afx_msg void OnTimer(UINT_PTR nIDEvent);
+    afx_msg void OnMouseMove(UINT nFlags, CPoint point);
+    afx_msg void OnLButtonDown(UINT nFlags, CPoint point);
+    afx_msg void OnLButtonUp(UINT nFlags, CPoint point);
+    afx_msg void OnLButtonDblClk(UINT nFlags, CPoint point);
+    afx_msg void OnRButtonDown(UINT nFlags, CPoint point);
+    afx_msg void OnRButtonUp(UINT nFlags, CPoint point);
+    afx_msg void OnRButtonDblClk(UINT nFlags, CPoint point);
+    afx_msg void OnMButtonDown(UINT nFlags, CPoint point);
+    afx_msg void OnMButtonUp(UINT nFlags, CPoint point);
+    afx_msg void OnMButtonDblClk(UINT nFlags, CPoint point);
+    afx_msg BOOL OnMouseWheel(UINT nFlags, short zDelta, CPoint pt);
+    afx_msg void OnCaptureChanged(CWnd* pWnd);
+    afx_msg void OnSetFocus(CWnd* pOldWnd);
+    afx_msg void OnKillFocus(CWnd* pNewWnd);
+    afx_msg void OnWindowPosChanged(WINDOWPOS* lpwndpos);
+    afx_msg void OnWindowPosChanging(WINDOWPOS* lpwndpos);
+    afx_msg void OnKeyDown(UINT nChar, UINT nRepCnt, UINT nFlags);
+    afx_msg void OnKeyUp(UINT nChar, UINT nRepCnt, UINT nFlags);
+    afx_msg void OnChar(UINT nChar, UINT nRepCnt, UINT nFlags);
+    afx_msg BOOL OnSetCursor(CWnd* pWnd, UINT nHitTest, UINT message);
+    afx_msg int OnMouseActivate(CWnd* pDesktopWnd, UINT nHitTest, UINT message);
+    afx_msg void OnGetMinMaxInfo(MINMAXINFO* lpMMI);
+    afx_msg void OnShowWindow(BOOL bShow, UINT nStatus);
+    afx_msg LRESULT OnNcHitTest(CPoint point);
+    afx_msg void OnContextMenu(CWnd* pWnd, CPoint pos);
+    afx_msg void OnCancelMode();
+    afx_msg UINT OnGetDlgCode();
 
-  WNDPROC m_pfnSuper = NULL;  // the window procedure before subclassing
+    WNDPROC m_pfnSuper = NULL;  // the window procedure before subclassing
 
-  DECLARE_MESSAGE_MAP()
+    DECLARE_MESSAGE_MAP()
 };
 
 // The framework's window procedure: the procedure of every window class the
@@ -678,126 +725,131 @@ AFX_FRAMEWORK_API BOOL AFXAPI AfxUnlockTempMaps(BOOL bDeleteTemps = TRUE);
 // Controls and dialogs
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CScrollBar : public CWnd {
+class AFX_FRAMEWORK_CLASS CScrollBar : public CWnd
+{
 public:
-  CScrollBar() = default;
-  ~CScrollBar() override = default;
-  virtual BOOL Create(DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID);
+    CScrollBar() = default;
+    ~CScrollBar() override = default;
+    virtual BOOL Create(DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID);
 
-  int GetScrollPos() const;
-  int SetScrollPos(int nPos, BOOL bRedraw = TRUE);
-  void GetScrollRange(LPINT lpMinPos, LPINT lpMaxPos) const;
-  void SetScrollRange(int nMinPos, int nMaxPos, BOOL bRedraw = TRUE);
-  void ShowScrollBar(BOOL bShow = TRUE);
-  BOOL EnableScrollBar(UINT nArrowFlags = ESB_ENABLE_BOTH);
-  BOOL SetScrollInfo(LPSCROLLINFO lpScrollInfo, BOOL bRedraw = TRUE);
-  BOOL GetScrollInfo(LPSCROLLINFO lpScrollInfo, UINT nMask = SIF_ALL);
-  int GetScrollLimit();
+    int GetScrollPos() const;
+    int SetScrollPos(int nPos, BOOL bRedraw = TRUE);
+    void GetScrollRange(LPINT lpMinPos, LPINT lpMaxPos) const;
+    void SetScrollRange(int nMinPos, int nMaxPos, BOOL bRedraw = TRUE);
+    void ShowScrollBar(BOOL bShow = TRUE);
+    BOOL EnableScrollBar(UINT nArrowFlags = ESB_ENABLE_BOTH);
+    BOOL SetScrollInfo(LPSCROLLINFO lpScrollInfo, BOOL bRedraw = TRUE);
+    BOOL GetScrollInfo(LPSCROLLINFO lpScrollInfo, UINT nMask = SIF_ALL);
+    int GetScrollLimit();
 };
 
-class AFX_FRAMEWORK_CLASS CButton : public CWnd {
+class AFX_FRAMEWORK_CLASS CButton : public CWnd
+{
 public:
-  CButton() = default;
-  ~CButton() override = default;
-  virtual BOOL Create(LPCTSTR lpszCaption, DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID);
+    CButton() = default;
+    ~CButton() override = default;
+    virtual BOOL Create(LPCTSTR lpszCaption, DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID);
 
-  UINT GetState() const;
-  void SetState(BOOL bHighlight);
-  int GetCheck() const;
-  void SetCheck(int nCheck);
-  UINT GetButtonStyle() const;
-  void SetButtonStyle(UINT nStyle, BOOL bRedraw = TRUE);
+    UINT GetState() const;
+    void SetState(BOOL bHighlight);
+    int GetCheck() const;
+    void SetCheck(int nCheck);
+    UINT GetButtonStyle() const;
+    void SetButtonStyle(UINT nStyle, BOOL bRedraw = TRUE);
 };
 
 // The base of dialog classes. Dialogs here are shown by the common dialogs
 // (CPrintDialog::DoModal), which attach the CDialog to the real dialog window
 // while it exists and call OnInitDialog when it initialises.
-class AFX_FRAMEWORK_CLASS CDialog : public CWnd {
+class AFX_FRAMEWORK_CLASS CDialog : public CWnd
+{
 public:
-  ~CDialog() override = default;
-  // Called once the dialog and its controls exist. TRUE lets the dialog set
-  // the focus to its first control.
-  virtual BOOL OnInitDialog();
-  void EndDialog(int nResult);
+    ~CDialog() override = default;
+    // Called once the dialog and its controls exist. TRUE lets the dialog set
+    // the focus to its first control.
+    virtual BOOL OnInitDialog();
+    void EndDialog(int nResult);
 
 protected:
-  explicit CDialog(CWnd* pParentWnd = NULL) : m_pParentWnd(pParentWnd) {}
-  CWnd* m_pParentWnd = NULL;  // not owned
+    explicit CDialog(CWnd* pParentWnd = NULL) : m_pParentWnd(pParentWnd) { }
+    CWnd* m_pParentWnd = NULL;  // not owned
 };
 
 // ---------------------------------------------------------------------------
 // Threads and the application
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CWinThread : public CCmdTarget {
+class AFX_FRAMEWORK_CLASS CWinThread : public CCmdTarget
+{
 public:
-  CWnd* m_pMainWnd = NULL;    // not owned; its destruction ends Run
-  CWnd* m_pActiveWnd = NULL;  // not owned
-  BOOL m_bAutoDelete = FALSE;
-  HANDLE m_hThread = NULL;
-  DWORD m_nThreadID = 0;
-  MSG m_msgCur = {};          // the message being pumped
+    CWnd* m_pMainWnd = NULL;  // not owned; its destruction ends Run
+    CWnd* m_pActiveWnd = NULL;  // not owned
+    BOOL m_bAutoDelete = FALSE;
+    HANDLE m_hThread = NULL;
+    DWORD m_nThreadID = 0;
+    MSG m_msgCur = {};  // the message being pumped
 
-  CWinThread();
-  ~CWinThread() override = default;
+    CWinThread();
+    ~CWinThread() override = default;
 
-  virtual CWnd* GetMainWnd();
-  virtual BOOL InitInstance();
-  virtual int ExitInstance();
-  // The message loop: idle processing while the queue is empty, then
-  // PumpMessage until WM_QUIT; returns ExitInstance().
-  virtual int Run();
-  // Takes one message (waiting for it), offers it to PreTranslateMessage and
-  // dispatches it unless that returned TRUE. FALSE on WM_QUIT.
-  virtual BOOL PumpMessage();
-  // Offers the message to the target window and its parents
-  // (CWnd::WalkPreTranslateTree up to the main window), then to the main
-  // window if the target lies outside it.
-  virtual BOOL PreTranslateMessage(MSG* pMsg);
-  // Idle work between messages: deletes the temporary handle-map objects.
-  // Returns TRUE while more idle work is wanted.
-  virtual BOOL OnIdle(LONG lCount);
-  virtual BOOL IsIdleMessage(MSG* pMsg);
+    virtual CWnd* GetMainWnd();
+    virtual BOOL InitInstance();
+    virtual int ExitInstance();
+    // The message loop: idle processing while the queue is empty, then
+    // PumpMessage until WM_QUIT; returns ExitInstance().
+    virtual int Run();
+    // Takes one message (waiting for it), offers it to PreTranslateMessage and
+    // dispatches it unless that returned TRUE. FALSE on WM_QUIT.
+    virtual BOOL PumpMessage();
+    // Offers the message to the target window and its parents
+    // (CWnd::WalkPreTranslateTree up to the main window), then to the main
+    // window if the target lies outside it.
+    virtual BOOL PreTranslateMessage(MSG* pMsg);
+    // Idle work between messages: deletes the temporary handle-map objects.
+    // Returns TRUE while more idle work is wanted.
+    virtual BOOL OnIdle(LONG lCount);
+    virtual BOOL IsIdleMessage(MSG* pMsg);
 
 private:
-  CPoint m_ptCursorLast{-1, -1};
-  UINT m_nMsgLast = 0;
+    CPoint m_ptCursorLast {-1, -1};
+    UINT m_nMsgLast = 0;
 };
 
-class AFX_FRAMEWORK_CLASS CWinApp : public CWinThread {
+class AFX_FRAMEWORK_CLASS CWinApp : public CWinThread
+{
 public:
-  LPCTSTR m_pszAppName = NULL;
-  HINSTANCE m_hInstance = NULL;
-  LPTSTR m_lpCmdLine = NULL;
-  int m_nCmdShow = SW_SHOWNORMAL;
-  // The printer defaults of the application (DEVMODE and DEVNAMES, global
-  // memory owned by the application object).
-  HGLOBAL m_hDevMode = NULL;
-  HGLOBAL m_hDevNames = NULL;
+    LPCTSTR m_pszAppName = NULL;
+    HINSTANCE m_hInstance = NULL;
+    LPTSTR m_lpCmdLine = NULL;
+    int m_nCmdShow = SW_SHOWNORMAL;
+    // The printer defaults of the application (DEVMODE and DEVNAMES, global
+    // memory owned by the application object).
+    HGLOBAL m_hDevMode = NULL;
+    HGLOBAL m_hDevNames = NULL;
 
-  // Becomes the current application (AfxGetApp) until it is destroyed.
-  explicit CWinApp(LPCTSTR lpszAppName = NULL);
-  ~CWinApp() override;
+    // Becomes the current application (AfxGetApp) until it is destroyed.
+    explicit CWinApp(LPCTSTR lpszAppName = NULL);
+    ~CWinApp() override;
 
-  BOOL InitInstance() override;
-  int ExitInstance() override;
-  int Run() override;
+    BOOL InitInstance() override;
+    int ExitInstance() override;
+    int Run() override;
 
-  // Fills hDevMode and hDevNames of pPrintDlg with the application's default
-  // printer (taken once from PrintDlg with PD_RETURNDEFAULT and kept by the
-  // application, which still owns the handles). FALSE when there is no
-  // printer; pPrintDlg is then unchanged.
-  BOOL GetPrinterDeviceDefaults(PRINTDLG* pPrintDlg);
-  // Makes a DC for the application's default printer and attaches it to dc.
-  BOOL CreatePrinterDC(CDC& dc);
-  void UpdatePrinterSelection(BOOL bForceDefaults);
+    // Fills hDevMode and hDevNames of pPrintDlg with the application's default
+    // printer (taken once from PrintDlg with PD_RETURNDEFAULT and kept by the
+    // application, which still owns the handles). FALSE when there is no
+    // printer; pPrintDlg is then unchanged.
+    BOOL GetPrinterDeviceDefaults(PRINTDLG* pPrintDlg);
+    // Makes a DC for the application's default printer and attaches it to dc.
+    BOOL CreatePrinterDC(CDC& dc);
+    void UpdatePrinterSelection(BOOL bForceDefaults);
 
-  HCURSOR LoadCursor(LPCTSTR lpszResourceName) const;
-  HCURSOR LoadCursor(UINT nIDResource) const;
-  HCURSOR LoadStandardCursor(LPCTSTR lpszCursorName) const;
+    HCURSOR LoadCursor(LPCTSTR lpszResourceName) const;
+    HCURSOR LoadCursor(UINT nIDResource) const;
+    HCURSOR LoadStandardCursor(LPCTSTR lpszCursorName) const;
 
 private:
-  CWinApp* m_pPreviousApp = NULL;
+    CWinApp* m_pPreviousApp = NULL;
 };
 
 AFX_FRAMEWORK_API CWinApp* AFXAPI AfxGetApp();
@@ -813,16 +865,17 @@ AFX_FRAMEWORK_API BOOL AFXAPI AfxPumpMessage();
 
 // One link of the chain of libraries searched for resources. Constructing it
 // puts it at the front of the chain; destroying it takes it out.
-class AFX_FRAMEWORK_CLASS CDynLinkLibrary : public CCmdTarget {
+class AFX_FRAMEWORK_CLASS CDynLinkLibrary : public CCmdTarget
+{
 public:
-  explicit CDynLinkLibrary(AFX_EXTENSION_MODULE& state, BOOL bSystem = FALSE);
-  CDynLinkLibrary(HINSTANCE hModule, HINSTANCE hResource);
-  ~CDynLinkLibrary() override;
+    explicit CDynLinkLibrary(AFX_EXTENSION_MODULE& state, BOOL bSystem = FALSE);
+    CDynLinkLibrary(HINSTANCE hModule, HINSTANCE hResource);
+    ~CDynLinkLibrary() override;
 
-  HMODULE m_hModule = NULL;
-  HMODULE m_hResource = NULL;
-  BOOL m_bSystem = FALSE;
-  CDynLinkLibrary* m_pNextDLL = NULL;  // the next link of the chain, not owned
+    HMODULE m_hModule = NULL;
+    HMODULE m_hResource = NULL;
+    BOOL m_bSystem = FALSE;
+    CDynLinkLibrary* m_pNextDLL = NULL;  // the next link of the chain, not owned
 };
 
 #endif  // TAVO_FRAMEWORK_AFXWIN_H

@@ -21,57 +21,57 @@ constexpr const char* kImeWindowClass = "IME";
 // One kind of handle map: objects attached to handles for good (permanent)
 // and wrapper objects made on demand for handles nobody attached
 // (temporary, owned by the map and deleted by DeleteTemporaries).
-template <class Object>
-class HandleMap {
+template <class Object> class HandleMap
+{
 public:
-  Object* LookupPermanent(HANDLE h) const
-  {
-    const auto it = m_permanent.find(h);
-    return it == m_permanent.end() ? nullptr : it->second;
-  }
-  Object* LookupTemporary(HANDLE h) const
-  {
-    const auto it = m_temporary.find(h);
-    return it == m_temporary.end() ? nullptr : it->second;
-  }
-  void SetPermanent(HANDLE h, Object* object) { m_permanent[h] = object; }
-  void RemovePermanent(HANDLE h, const Object* object)
-  {
-    const auto it = m_permanent.find(h);
-    if (it != m_permanent.end() && it->second == object) m_permanent.erase(it);
-  }
-  void AddTemporary(HANDLE h, Object* object) { m_temporary[h] = object; }
-  // Deletes every temporary object after releaseHandle has cleared its
-  // handle, so that its destructor leaves the Windows object alone.
-  template <class ReleaseHandle>
-  void DeleteTemporaries(ReleaseHandle releaseHandle)
-  {
-    auto temporaries = std::move(m_temporary);
-    m_temporary.clear();
-    for (auto& entry : temporaries) {
-      releaseHandle(entry.second);
-      delete entry.second;
+    Object* LookupPermanent(HANDLE h) const
+    {
+        const auto it = m_permanent.find(h);
+        return it == m_permanent.end() ? nullptr : it->second;
     }
-  }
-  size_t TemporaryCount() const { return m_temporary.size(); }
+    Object* LookupTemporary(HANDLE h) const
+    {
+        const auto it = m_temporary.find(h);
+        return it == m_temporary.end() ? nullptr : it->second;
+    }
+    void SetPermanent(HANDLE h, Object* object) { m_permanent[h] = object; }
+    void RemovePermanent(HANDLE h, const Object* object)
+    {
+        const auto it = m_permanent.find(h);
+        if (it != m_permanent.end() && it->second == object)
+            m_permanent.erase(it);
+    }
+    void AddTemporary(HANDLE h, Object* object) { m_temporary[h] = object; }
+    // Deletes every temporary object after releaseHandle has cleared its
+    // handle, so that its destructor leaves the Windows object alone.
+    template <class ReleaseHandle> void DeleteTemporaries(ReleaseHandle releaseHandle)
+    {
+        auto temporaries = std::move(m_temporary);
+        m_temporary.clear();
+        for (auto& entry : temporaries) {
+            releaseHandle(entry.second);
+            delete entry.second;
+        }
+    }
+    size_t TemporaryCount() const { return m_temporary.size(); }
 
 private:
-  std::unordered_map<HANDLE, Object*> m_permanent;
-  std::unordered_map<HANDLE, Object*> m_temporary;
+    std::unordered_map<HANDLE, Object*> m_permanent;
+    std::unordered_map<HANDLE, Object*> m_temporary;
 };
 
 struct ThreadState {
-  HandleMap<CWnd> windows;
-  HandleMap<CDC> dcs;
-  HandleMap<CGdiObject> gdiObjects;
-  int tempMapLocks = 0;
+    HandleMap<CWnd> windows;
+    HandleMap<CDC> dcs;
+    HandleMap<CGdiObject> gdiObjects;
+    int tempMapLocks = 0;
 
-  // The message the window procedure is handling now (CWnd::Default).
-  MSG currentMessage = {};
+    // The message the window procedure is handling now (CWnd::Default).
+    MSG currentMessage = {};
 
-  // Window creation: the object that the next created window attaches to.
-  CWnd* windowBeingCreated = nullptr;
-  HHOOK creationHook = nullptr;
+    // Window creation: the object that the next created window attaches to.
+    CWnd* windowBeingCreated = nullptr;
+    HHOOK creationHook = nullptr;
 };
 
 // The calling thread's state.

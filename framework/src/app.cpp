@@ -14,21 +14,24 @@ CWinThread* AfxGetThread() { return g_currentApp; }
 
 CWnd* AfxGetMainWnd()
 {
-  CWinThread* thread = AfxGetThread();
-  return thread != NULL ? thread->GetMainWnd() : NULL;
+    CWinThread* thread = AfxGetThread();
+    return thread != NULL ? thread->GetMainWnd() : NULL;
 }
 
 CWinApp::CWinApp(LPCTSTR lpszAppName)
     : m_pszAppName(lpszAppName), m_hInstance(::GetModuleHandleA(NULL)), m_pPreviousApp(g_currentApp)
 {
-  g_currentApp = this;
+    g_currentApp = this;
 }
 
 CWinApp::~CWinApp()
 {
-  if (m_hDevMode != NULL) ::GlobalFree(m_hDevMode);
-  if (m_hDevNames != NULL) ::GlobalFree(m_hDevNames);
-  if (g_currentApp == this) g_currentApp = m_pPreviousApp;
+    if (m_hDevMode != NULL)
+        ::GlobalFree(m_hDevMode);
+    if (m_hDevNames != NULL)
+        ::GlobalFree(m_hDevNames);
+    if (g_currentApp == this)
+        g_currentApp = m_pPreviousApp;
 }
 
 BOOL CWinApp::InitInstance() { return TRUE; }
@@ -39,41 +42,49 @@ int CWinApp::Run() { return CWinThread::Run(); }
 
 void CWinApp::UpdatePrinterSelection(BOOL bForceDefaults)
 {
-  if (!bForceDefaults && m_hDevNames != NULL) return;
-  CPrintDialog defaults(TRUE);
-  if (!defaults.GetDefaults()) return;
-  if (m_hDevMode != NULL) ::GlobalFree(m_hDevMode);
-  if (m_hDevNames != NULL) ::GlobalFree(m_hDevNames);
-  m_hDevMode = defaults.m_pd.hDevMode;
-  m_hDevNames = defaults.m_pd.hDevNames;
+    if (!bForceDefaults && m_hDevNames != NULL)
+        return;
+    CPrintDialog defaults(TRUE);
+    if (!defaults.GetDefaults())
+        return;
+    if (m_hDevMode != NULL)
+        ::GlobalFree(m_hDevMode);
+    if (m_hDevNames != NULL)
+        ::GlobalFree(m_hDevNames);
+    m_hDevMode = defaults.m_pd.hDevMode;
+    m_hDevNames = defaults.m_pd.hDevNames;
 }
 
 BOOL CWinApp::GetPrinterDeviceDefaults(PRINTDLG* pPrintDlg)
 {
-  if (pPrintDlg == NULL) return FALSE;
-  UpdatePrinterSelection(m_hDevNames == NULL);
-  if (m_hDevNames == NULL) return FALSE;
-  pPrintDlg->hDevNames = m_hDevNames;
-  pPrintDlg->hDevMode = m_hDevMode;
-  return TRUE;
+    if (pPrintDlg == NULL)
+        return FALSE;
+    UpdatePrinterSelection(m_hDevNames == NULL);
+    if (m_hDevNames == NULL)
+        return FALSE;
+    pPrintDlg->hDevNames = m_hDevNames;
+    pPrintDlg->hDevMode = m_hDevMode;
+    return TRUE;
 }
 
 BOOL CWinApp::CreatePrinterDC(CDC& dc)
 {
-  CPrintDialog printer(FALSE);
-  if (!GetPrinterDeviceDefaults(&printer.m_pd)) return FALSE;
-  const HDC hDC = printer.CreatePrinterDC();
-  if (hDC == NULL) return FALSE;
-  if (!dc.Attach(hDC)) {
-    ::DeleteDC(hDC);
-    return FALSE;
-  }
-  return TRUE;
+    CPrintDialog printer(FALSE);
+    if (!GetPrinterDeviceDefaults(&printer.m_pd))
+        return FALSE;
+    const HDC hDC = printer.CreatePrinterDC();
+    if (hDC == NULL)
+        return FALSE;
+    if (!dc.Attach(hDC)) {
+        ::DeleteDC(hDC);
+        return FALSE;
+    }
+    return TRUE;
 }
 
 HCURSOR CWinApp::LoadCursor(LPCTSTR lpszResourceName) const
 {
-  return ::LoadCursorA(AfxFindResourceHandle(lpszResourceName, RT_GROUP_CURSOR), lpszResourceName);
+    return ::LoadCursorA(AfxFindResourceHandle(lpszResourceName, RT_GROUP_CURSOR), lpszResourceName);
 }
 
 HCURSOR CWinApp::LoadCursor(UINT nIDResource) const { return LoadCursor(MAKEINTRESOURCEA(nIDResource)); }

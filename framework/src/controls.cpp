@@ -11,43 +11,44 @@ constexpr const char* kButtonClass = "BUTTON";
 
 BOOL CScrollBar::Create(DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID)
 {
-  return CWnd::Create(kScrollBarClass, NULL, dwStyle, rect, pParentWnd, nID);
+    return CWnd::Create(kScrollBarClass, NULL, dwStyle, rect, pParentWnd, nID);
 }
 
 int CScrollBar::GetScrollPos() const { return ::GetScrollPos(m_hWnd, SB_CTL); }
 int CScrollBar::SetScrollPos(int nPos, BOOL bRedraw) { return ::SetScrollPos(m_hWnd, SB_CTL, nPos, bRedraw); }
 void CScrollBar::GetScrollRange(LPINT lpMinPos, LPINT lpMaxPos) const
 {
-  ::GetScrollRange(m_hWnd, SB_CTL, lpMinPos, lpMaxPos);
+    ::GetScrollRange(m_hWnd, SB_CTL, lpMinPos, lpMaxPos);
 }
 void CScrollBar::SetScrollRange(int nMinPos, int nMaxPos, BOOL bRedraw)
 {
-  ::SetScrollRange(m_hWnd, SB_CTL, nMinPos, nMaxPos, bRedraw);
+    ::SetScrollRange(m_hWnd, SB_CTL, nMinPos, nMaxPos, bRedraw);
 }
 void CScrollBar::ShowScrollBar(BOOL bShow) { ::ShowScrollBar(m_hWnd, SB_CTL, bShow); }
 BOOL CScrollBar::EnableScrollBar(UINT nArrowFlags) { return ::EnableScrollBar(m_hWnd, SB_CTL, nArrowFlags); }
 BOOL CScrollBar::SetScrollInfo(LPSCROLLINFO lpScrollInfo, BOOL bRedraw)
 {
-  return CWnd::SetScrollInfo(SB_CTL, lpScrollInfo, bRedraw);
+    return CWnd::SetScrollInfo(SB_CTL, lpScrollInfo, bRedraw);
 }
 BOOL CScrollBar::GetScrollInfo(LPSCROLLINFO lpScrollInfo, UINT nMask)
 {
-  return CWnd::GetScrollInfo(SB_CTL, lpScrollInfo, nMask);
+    return CWnd::GetScrollInfo(SB_CTL, lpScrollInfo, nMask);
 }
 int CScrollBar::GetScrollLimit()
 {
-  SCROLLINFO info = {};
-  if (!GetScrollInfo(&info, SIF_RANGE | SIF_PAGE)) return 0;
-  // The highest position the thumb can reach leaves one page visible.
-  const int pageReach = info.nPage > 0 ? static_cast<int>(info.nPage) - 1 : 0;
-  return info.nMax - pageReach;
+    SCROLLINFO info = {};
+    if (!GetScrollInfo(&info, SIF_RANGE | SIF_PAGE))
+        return 0;
+    // The highest position the thumb can reach leaves one page visible.
+    const int pageReach = info.nPage > 0 ? static_cast<int>(info.nPage) - 1 : 0;
+    return info.nMax - pageReach;
 }
 
 // CButton
 
 BOOL CButton::Create(LPCTSTR lpszCaption, DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID)
 {
-  return CWnd::Create(kButtonClass, lpszCaption, dwStyle, rect, pParentWnd, nID);
+    return CWnd::Create(kButtonClass, lpszCaption, dwStyle, rect, pParentWnd, nID);
 }
 
 UINT CButton::GetState() const { return static_cast<UINT>(::SendMessageA(m_hWnd, BM_GETSTATE, 0, 0)); }

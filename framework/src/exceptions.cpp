@@ -9,22 +9,27 @@ constexpr const char* kResourceExceptionText = "A required resource was unavaila
 
 void CException::Delete()
 {
-  if (m_bAutoDelete) delete this;
+    if (m_bAutoDelete)
+        delete this;
 }
 
 BOOL CException::GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext) const
 {
-  if (pnHelpContext != NULL) *pnHelpContext = 0;
-  if (lpszError != NULL && nMaxError > 0) *lpszError = '\0';
-  return FALSE;
+    if (pnHelpContext != NULL)
+        *pnHelpContext = 0;
+    if (lpszError != NULL && nMaxError > 0)
+        *lpszError = '\0';
+    return FALSE;
 }
 
 BOOL CResourceException::GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext) const
 {
-  if (pnHelpContext != NULL) *pnHelpContext = 0;
-  if (lpszError == NULL || nMaxError == 0) return FALSE;
-  ::lstrcpynA(lpszError, kResourceExceptionText, static_cast<int>(nMaxError));
-  return TRUE;
+    if (pnHelpContext != NULL)
+        *pnHelpContext = 0;
+    if (lpszError == NULL || nMaxError == 0)
+        return FALSE;
+    ::lstrcpynA(lpszError, kResourceExceptionText, static_cast<int>(nMaxError));
+    return TRUE;
 }
 
 void AfxThrowResourceException() { throw new CResourceException(); }

@@ -6,8 +6,9 @@ CGdiObject::~CGdiObject() { DeleteObject(); }
 
 BOOL CGdiObject::DeleteObject()
 {
-  if (m_hObject == NULL) return FALSE;
-  return ::DeleteObject(Detach());
+    if (m_hObject == NULL)
+        return FALSE;
+    return ::DeleteObject(Detach());
 }
 
 int CGdiObject::GetObject(int nCount, LPVOID lpObject) const { return ::GetObjectA(m_hObject, nCount, lpObject); }
@@ -21,12 +22,13 @@ CPen* CPen::FromHandle(HPEN hPen) { return static_cast<CPen*>(CGdiObject::FromHa
 
 CPen::CPen(int nPenStyle, int nWidth, COLORREF crColor)
 {
-  if (!CreatePen(nPenStyle, nWidth, crColor)) AfxThrowResourceException();
+    if (!CreatePen(nPenStyle, nWidth, crColor))
+        AfxThrowResourceException();
 }
 
 BOOL CPen::CreatePen(int nPenStyle, int nWidth, COLORREF crColor)
 {
-  return Attach(::CreatePen(nPenStyle, nWidth, crColor));
+    return Attach(::CreatePen(nPenStyle, nWidth, crColor));
 }
 
 BOOL CPen::CreatePenIndirect(LPLOGPEN lpLogPen) { return Attach(::CreatePenIndirect(lpLogPen)); }
@@ -39,7 +41,8 @@ CBrush* CBrush::FromHandle(HBRUSH hBrush) { return static_cast<CBrush*>(CGdiObje
 
 CBrush::CBrush(COLORREF crColor)
 {
-  if (!CreateSolidBrush(crColor)) AfxThrowResourceException();
+    if (!CreateSolidBrush(crColor))
+        AfxThrowResourceException();
 }
 
 BOOL CBrush::CreateSolidBrush(COLORREF crColor) { return Attach(::CreateSolidBrush(crColor)); }
@@ -55,12 +58,11 @@ CFont* CFont::FromHandle(HFONT hFont) { return static_cast<CFont*>(CGdiObject::F
 BOOL CFont::CreateFontIndirect(const LOGFONT* lpLogFont) { return Attach(::CreateFontIndirectA(lpLogFont)); }
 
 BOOL CFont::CreateFont(int nHeight, int nWidth, int nEscapement, int nOrientation, int nWeight, BYTE bItalic,
-                       BYTE bUnderline, BYTE cStrikeOut, BYTE nCharSet, BYTE nOutPrecision,
-                       BYTE nClipPrecision, BYTE nQuality, BYTE nPitchAndFamily, LPCTSTR lpszFacename)
+                       BYTE bUnderline, BYTE cStrikeOut, BYTE nCharSet, BYTE nOutPrecision, BYTE nClipPrecision,
+                       BYTE nQuality, BYTE nPitchAndFamily, LPCTSTR lpszFacename)
 {
-  return Attach(::CreateFontA(nHeight, nWidth, nEscapement, nOrientation, nWeight, bItalic, bUnderline,
-                              cStrikeOut, nCharSet, nOutPrecision, nClipPrecision, nQuality,
-                              nPitchAndFamily, lpszFacename));
+    return Attach(::CreateFontA(nHeight, nWidth, nEscapement, nOrientation, nWeight, bItalic, bUnderline, cStrikeOut,
+                                nCharSet, nOutPrecision, nClipPrecision, nQuality, nPitchAndFamily, lpszFacename));
 }
 
 int CFont::GetLogFont(LOGFONT* pLogFont) { return ::GetObjectA(m_hObject, sizeof(LOGFONTA), pLogFont); }
@@ -74,15 +76,18 @@ BOOL CRgn::CreateRectRgnIndirect(LPCRECT lpRect) { return Attach(::CreateRectRgn
 BOOL CRgn::CreateEllipticRgn(int x1, int y1, int x2, int y2) { return Attach(::CreateEllipticRgn(x1, y1, x2, y2)); }
 BOOL CRgn::CreatePolygonRgn(LPPOINT lpPoints, int nCount, int nMode)
 {
-  return Attach(::CreatePolygonRgn(lpPoints, nCount, nMode));
+    return Attach(::CreatePolygonRgn(lpPoints, nCount, nMode));
 }
 void CRgn::SetRectRgn(int x1, int y1, int x2, int y2) { ::SetRectRgn((HRGN)m_hObject, x1, y1, x2, y2); }
 void CRgn::SetRectRgn(LPCRECT lpRect) { SetRectRgn(lpRect->left, lpRect->top, lpRect->right, lpRect->bottom); }
 int CRgn::CombineRgn(CRgn* pRgn1, CRgn* pRgn2, int nCombineMode)
 {
-  return ::CombineRgn((HRGN)m_hObject, (HRGN)pRgn1->GetSafeHandle(), (HRGN)pRgn2->GetSafeHandle(), nCombineMode);
+    return ::CombineRgn((HRGN)m_hObject, (HRGN)pRgn1->GetSafeHandle(), (HRGN)pRgn2->GetSafeHandle(), nCombineMode);
 }
-int CRgn::CopyRgn(CRgn* pRgnSrc) { return ::CombineRgn((HRGN)m_hObject, (HRGN)pRgnSrc->GetSafeHandle(), NULL, RGN_COPY); }
+int CRgn::CopyRgn(CRgn* pRgnSrc)
+{
+    return ::CombineRgn((HRGN)m_hObject, (HRGN)pRgnSrc->GetSafeHandle(), NULL, RGN_COPY);
+}
 BOOL CRgn::EqualRgn(CRgn* pRgn) const { return ::EqualRgn((HRGN)m_hObject, (HRGN)pRgn->GetSafeHandle()); }
 int CRgn::OffsetRgn(int x, int y) { return ::OffsetRgn((HRGN)m_hObject, x, y); }
 int CRgn::OffsetRgn(POINT point) { return OffsetRgn(point.x, point.y); }

@@ -14,13 +14,13 @@ const AFX_MSGMAP* CCmdTarget::GetMessageMap() const { return GetThisMessageMap()
 
 const AFX_MSGMAP* CCmdTarget::GetThisMessageMap()
 {
-  static const AFX_MSGMAP_ENTRY entries[] = {{0, 0, 0, 0, AfxSig_end, (AFX_PMSG)0}};
-  static const AFX_MSGMAP messageMap = {NULL, &entries[0]};
-  return &messageMap;
+    static const AFX_MSGMAP_ENTRY entries[] = {{0, 0, 0, 0, AfxSig_end, (AFX_PMSG)0}};
+    static const AFX_MSGMAP messageMap = {NULL, &entries[0]};
+    return &messageMap;
 }
 
 BEGIN_MESSAGE_MAP(CWnd, CCmdTarget)
-  ON_WM_NCDESTROY()
+    ON_WM_NCDESTROY()
 END_MESSAGE_MAP()
 
 // ---------------------------------------------------------------------------
@@ -31,21 +31,22 @@ namespace {
 
 bool EntryMatches(const AFX_MSGMAP_ENTRY& entry, UINT message)
 {
-  if (entry.nMessage == AFX_REGISTERED_MESSAGE_CODE) {
-    const auto* registeredId = reinterpret_cast<const UINT*>(entry.nSig);
-    return registeredId != NULL && *registeredId != 0 && *registeredId == message;
-  }
-  return entry.nMessage == message;
+    if (entry.nMessage == AFX_REGISTERED_MESSAGE_CODE) {
+        const auto* registeredId = reinterpret_cast<const UINT*>(entry.nSig);
+        return registeredId != NULL && *registeredId != 0 && *registeredId == message;
+    }
+    return entry.nMessage == message;
 }
 
 const AFX_MSGMAP_ENTRY* FindEntry(const AFX_MSGMAP* map, UINT message)
 {
-  for (; map != NULL; map = map->pfnGetBaseMap != NULL ? map->pfnGetBaseMap() : NULL) {
-    for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->nSig != AfxSig_end; ++entry) {
-      if (EntryMatches(*entry, message)) return entry;
+    for (; map != NULL; map = map->pfnGetBaseMap != NULL ? map->pfnGetBaseMap() : NULL) {
+        for (const AFX_MSGMAP_ENTRY* entry = map->lpEntries; entry->nSig != AfxSig_end; ++entry) {
+            if (EntryMatches(*entry, message))
+                return entry;
+        }
     }
-  }
-  return NULL;
+    return NULL;
 }
 
 // Calls the handler of entry for the message; the entry's signature says
@@ -54,80 +55,77 @@ const AFX_MSGMAP_ENTRY* FindEntry(const AFX_MSGMAP* map, UINT message)
 PTM_WARNING_DISABLE
 LRESULT CallHandler(CWnd* pWnd, const AFX_MSGMAP_ENTRY& entry, WPARAM wParam, LPARAM lParam)
 {
-  const AFX_PMSGW pfn = static_cast<AFX_PMSGW>(entry.pfn);
-  if (entry.nMessage == AFX_REGISTERED_MESSAGE_CODE) {
-    return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(WPARAM, LPARAM)>(pfn))(wParam, lParam);
-  }
-  const CPoint point(lParam);
-  switch (entry.nSig) {
-  case AfxSig_lwl:
-    return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(WPARAM, LPARAM)>(pfn))(wParam, lParam);
-  case AfxSig_vv:
-    (pWnd->*pfn)();
-    return 0;
-  case AfxSig_is:
-    return (pWnd->*reinterpret_cast<int (CWnd::*)(LPCREATESTRUCT)>(pfn))(
-        reinterpret_cast<LPCREATESTRUCT>(lParam));
-  case AfxSig_bD:
-    return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(CDC*)>(pfn))(
-        CDC::FromHandle(reinterpret_cast<HDC>(wParam)));
-  case AfxSig_vwii:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, int, int)>(pfn))(
-        static_cast<UINT>(wParam), static_cast<short>(LOWORD(lParam)), static_cast<short>(HIWORD(lParam)));
-    return 0;
-  case AfxSig_vii:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(int, int)>(pfn))(
-        static_cast<short>(LOWORD(lParam)), static_cast<short>(HIWORD(lParam)));
-    return 0;
-  case AfxSig_vwwx:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, UINT, CScrollBar*)>(pfn))(
-        LOWORD(wParam), HIWORD(wParam),
-        static_cast<CScrollBar*>(CWnd::FromHandle(reinterpret_cast<HWND>(lParam))));
-    return 0;
-  case AfxSig_vt:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(UINT_PTR)>(pfn))(static_cast<UINT_PTR>(wParam));
-    return 0;
-  case AfxSig_vwp:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, CPoint)>(pfn))(static_cast<UINT>(wParam), point);
-    return 0;
-  case AfxSig_bwsp:
-    return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(UINT, short, CPoint)>(pfn))(
-        LOWORD(wParam), static_cast<short>(HIWORD(wParam)), point);
-  case AfxSig_vW:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(CWnd*)>(pfn))(
-        CWnd::FromHandle(reinterpret_cast<HWND>(entry.nMessage == WM_CAPTURECHANGED ? lParam : wParam)));
-    return 0;
-  case AfxSig_vPOS:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(WINDOWPOS*)>(pfn))(reinterpret_cast<WINDOWPOS*>(lParam));
-    return 0;
-  case AfxSig_vwww:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, UINT, UINT)>(pfn))(
-        static_cast<UINT>(wParam), LOWORD(lParam), HIWORD(lParam));
-    return 0;
-  case AfxSig_bWww:
-    return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(CWnd*, UINT, UINT)>(pfn))(
-        CWnd::FromHandle(reinterpret_cast<HWND>(wParam)), LOWORD(lParam), HIWORD(lParam));
-  case AfxSig_iWww:
-    return (pWnd->*reinterpret_cast<int (CWnd::*)(CWnd*, UINT, UINT)>(pfn))(
-        CWnd::FromHandle(reinterpret_cast<HWND>(wParam)), LOWORD(lParam), HIWORD(lParam));
-  case AfxSig_vMMI:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(MINMAXINFO*)>(pfn))(reinterpret_cast<MINMAXINFO*>(lParam));
-    return 0;
-  case AfxSig_vbw:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(BOOL, UINT)>(pfn))(
-        static_cast<BOOL>(wParam), static_cast<UINT>(lParam));
-    return 0;
-  case AfxSig_lp:
-    return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(CPoint)>(pfn))(point);
-  case AfxSig_vWp:
-    (pWnd->*reinterpret_cast<void (CWnd::*)(CWnd*, CPoint)>(pfn))(
-        CWnd::FromHandle(reinterpret_cast<HWND>(wParam)), point);
-    return 0;
-  case AfxSig_wv:
-    return (pWnd->*reinterpret_cast<UINT (CWnd::*)()>(pfn))();
-  default:
-    return 0;
-  }
+    const AFX_PMSGW pfn = static_cast<AFX_PMSGW>(entry.pfn);
+    if (entry.nMessage == AFX_REGISTERED_MESSAGE_CODE) {
+        return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(WPARAM, LPARAM)>(pfn))(wParam, lParam);
+    }
+    const CPoint point(lParam);
+    switch (entry.nSig) {
+    case AfxSig_lwl:
+        return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(WPARAM, LPARAM)>(pfn))(wParam, lParam);
+    case AfxSig_vv:
+        (pWnd->*pfn)();
+        return 0;
+    case AfxSig_is:
+        return (pWnd->*reinterpret_cast<int (CWnd::*)(LPCREATESTRUCT)>(pfn))(reinterpret_cast<LPCREATESTRUCT>(lParam));
+    case AfxSig_bD:
+        return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(CDC*)>(pfn))(CDC::FromHandle(reinterpret_cast<HDC>(wParam)));
+    case AfxSig_vwii:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, int, int)>(pfn))(
+            static_cast<UINT>(wParam), static_cast<short>(LOWORD(lParam)), static_cast<short>(HIWORD(lParam)));
+        return 0;
+    case AfxSig_vii:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(int, int)>(pfn))(static_cast<short>(LOWORD(lParam)),
+                                                                 static_cast<short>(HIWORD(lParam)));
+        return 0;
+    case AfxSig_vwwx:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, UINT, CScrollBar*)>(pfn))(
+            LOWORD(wParam), HIWORD(wParam), static_cast<CScrollBar*>(CWnd::FromHandle(reinterpret_cast<HWND>(lParam))));
+        return 0;
+    case AfxSig_vt:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(UINT_PTR)>(pfn))(static_cast<UINT_PTR>(wParam));
+        return 0;
+    case AfxSig_vwp:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, CPoint)>(pfn))(static_cast<UINT>(wParam), point);
+        return 0;
+    case AfxSig_bwsp:
+        return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(UINT, short, CPoint)>(pfn))(
+            LOWORD(wParam), static_cast<short>(HIWORD(wParam)), point);
+    case AfxSig_vW:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(CWnd*)>(pfn))(
+            CWnd::FromHandle(reinterpret_cast<HWND>(entry.nMessage == WM_CAPTURECHANGED ? lParam : wParam)));
+        return 0;
+    case AfxSig_vPOS:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(WINDOWPOS*)>(pfn))(reinterpret_cast<WINDOWPOS*>(lParam));
+        return 0;
+    case AfxSig_vwww:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(UINT, UINT, UINT)>(pfn))(static_cast<UINT>(wParam), LOWORD(lParam),
+                                                                         HIWORD(lParam));
+        return 0;
+    case AfxSig_bWww:
+        return (pWnd->*reinterpret_cast<BOOL (CWnd::*)(CWnd*, UINT, UINT)>(pfn))(
+            CWnd::FromHandle(reinterpret_cast<HWND>(wParam)), LOWORD(lParam), HIWORD(lParam));
+    case AfxSig_iWww:
+        return (pWnd->*reinterpret_cast<int (CWnd::*)(CWnd*, UINT, UINT)>(pfn))(
+            CWnd::FromHandle(reinterpret_cast<HWND>(wParam)), LOWORD(lParam), HIWORD(lParam));
+    case AfxSig_vMMI:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(MINMAXINFO*)>(pfn))(reinterpret_cast<MINMAXINFO*>(lParam));
+        return 0;
+    case AfxSig_vbw:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(BOOL, UINT)>(pfn))(static_cast<BOOL>(wParam),
+                                                                   static_cast<UINT>(lParam));
+        return 0;
+    case AfxSig_lp:
+        return (pWnd->*reinterpret_cast<LRESULT (CWnd::*)(CPoint)>(pfn))(point);
+    case AfxSig_vWp:
+        (pWnd->*reinterpret_cast<void (CWnd::*)(CWnd*, CPoint)>(pfn))(CWnd::FromHandle(reinterpret_cast<HWND>(wParam)),
+                                                                      point);
+        return 0;
+    case AfxSig_wv:
+        return (pWnd->*reinterpret_cast<UINT (CWnd::*)()>(pfn))();
+    default:
+        return 0;
+    }
 }
 PTM_WARNING_RESTORE
 
@@ -135,31 +133,35 @@ PTM_WARNING_RESTORE
 
 BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* pResult)
 {
-  const AFX_MSGMAP_ENTRY* entry = FindEntry(GetMessageMap(), message);
-  if (entry == NULL) return FALSE;
-  const LRESULT result = CallHandler(this, *entry, wParam, lParam);
-  if (pResult != NULL) *pResult = result;
-  return TRUE;
+    const AFX_MSGMAP_ENTRY* entry = FindEntry(GetMessageMap(), message);
+    if (entry == NULL)
+        return FALSE;
+    const LRESULT result = CallHandler(this, *entry, wParam, lParam);
+    if (pResult != NULL)
+        *pResult = result;
+    return TRUE;
 }
 
 LRESULT CWnd::WindowProc(UINT message, WPARAM wParam, LPARAM lParam)
 {
-  LRESULT result = 0;
-  if (!OnWndMsg(message, wParam, lParam, &result)) result = DefWindowProc(message, wParam, lParam);
-  return result;
+    LRESULT result = 0;
+    if (!OnWndMsg(message, wParam, lParam, &result))
+        result = DefWindowProc(message, wParam, lParam);
+    return result;
 }
 
 LRESULT CWnd::DefWindowProc(UINT message, WPARAM wParam, LPARAM lParam)
 {
-  const WNDPROC super = *GetSuperWndProcAddr();
-  if (super != NULL) return ::CallWindowProcA(super, m_hWnd, message, wParam, lParam);
-  return ::DefWindowProcA(m_hWnd, message, wParam, lParam);
+    const WNDPROC super = *GetSuperWndProcAddr();
+    if (super != NULL)
+        return ::CallWindowProcA(super, m_hWnd, message, wParam, lParam);
+    return ::DefWindowProcA(m_hWnd, message, wParam, lParam);
 }
 
 LRESULT CWnd::Default()
 {
-  const MSG& current = CurrentThreadState().currentMessage;
-  return DefWindowProc(current.message, current.wParam, current.lParam);
+    const MSG& current = CurrentThreadState().currentMessage;
+    return DefWindowProc(current.message, current.wParam, current.lParam);
 }
 
 // ---------------------------------------------------------------------------
@@ -170,13 +172,16 @@ BOOL CWnd::PreTranslateMessage(MSG* /*pMsg*/) { return FALSE; }
 
 BOOL CWnd::WalkPreTranslateTree(HWND hWndStop, MSG* pMsg)
 {
-  if (pMsg == NULL) return FALSE;
-  for (HWND hWnd = pMsg->hwnd; hWnd != NULL; hWnd = ::GetParent(hWnd)) {
-    CWnd* pWnd = FromHandlePermanent(hWnd);
-    if (pWnd != NULL && pWnd->PreTranslateMessage(pMsg)) return TRUE;
-    if (hWnd == hWndStop) break;
-  }
-  return FALSE;
+    if (pMsg == NULL)
+        return FALSE;
+    for (HWND hWnd = pMsg->hwnd; hWnd != NULL; hWnd = ::GetParent(hWnd)) {
+        CWnd* pWnd = FromHandlePermanent(hWnd);
+        if (pWnd != NULL && pWnd->PreTranslateMessage(pMsg))
+            return TRUE;
+        if (hWnd == hWndStop)
+            break;
+    }
+    return FALSE;
 }
 
 // ---------------------------------------------------------------------------
@@ -185,15 +190,16 @@ BOOL CWnd::WalkPreTranslateTree(HWND hWndStop, MSG* pMsg)
 
 void CWnd::OnNcDestroy()
 {
-  // The end of the main window ends the application's message loop.
-  CWinThread* thread = AfxGetThread();
-  if (thread != NULL && thread->m_pMainWnd == this) {
-    thread->m_pMainWnd = NULL;
-    ::PostQuitMessage(0);
-  }
-  if (thread != NULL && thread->m_pActiveWnd == this) thread->m_pActiveWnd = NULL;
-  Default();
-  afx_internal::DetachDestroyedWindow(this);
+    // The end of the main window ends the application's message loop.
+    CWinThread* thread = AfxGetThread();
+    if (thread != NULL && thread->m_pMainWnd == this) {
+        thread->m_pMainWnd = NULL;
+        ::PostQuitMessage(0);
+    }
+    if (thread != NULL && thread->m_pActiveWnd == this)
+        thread->m_pActiveWnd = NULL;
+    Default();
+    afx_internal::DetachDestroyedWindow(this);
 }
 
 int CWnd::OnCreate(LPCREATESTRUCT) { return static_cast<int>(Default()); }

@@ -4,21 +4,20 @@
 
 CPaintDC::CPaintDC(CWnd* pWnd) : m_hWnd(pWnd->GetSafeHwnd())
 {
-  if (!Attach(::BeginPaint(m_hWnd, &m_ps))) AfxThrowResourceException();
+    if (!Attach(::BeginPaint(m_hWnd, &m_ps)))
+        AfxThrowResourceException();
 }
 
 CPaintDC::~CPaintDC()
 {
-  ::EndPaint(m_hWnd, &m_ps);
-  Detach();
+    ::EndPaint(m_hWnd, &m_ps);
+    Detach();
 }
 
 CClientDC::CClientDC(CWnd* pWnd) : m_hWnd(pWnd->GetSafeHwnd())
 {
-  if (!Attach(::GetDC(m_hWnd))) AfxThrowResourceException();
+    if (!Attach(::GetDC(m_hWnd)))
+        AfxThrowResourceException();
 }
 
-CClientDC::~CClientDC()
-{
-  ::ReleaseDC(m_hWnd, Detach());
-}
+CClientDC::~CClientDC() { ::ReleaseDC(m_hWnd, Detach()); }

@@ -8,22 +8,24 @@ constexpr UINT kLastPossiblePage = 0xFFFF;
 
 CPrintInfo::CPrintInfo() : m_pPD(new CPrintDialog(FALSE, kPrintInfoDialogFlags))
 {
-  SetMinPage(1);
-  SetMaxPage(kLastPossiblePage);
-  m_pPD->m_pd.nFromPage = 1;
-  m_pPD->m_pd.nToPage = static_cast<WORD>(kLastPossiblePage);
+    SetMinPage(1);
+    SetMaxPage(kLastPossiblePage);
+    m_pPD->m_pd.nFromPage = 1;
+    m_pPD->m_pd.nToPage = static_cast<WORD>(kLastPossiblePage);
 }
 
 CPrintInfo::~CPrintInfo() { delete m_pPD; }
 
 void CPrintInfo::SetMinPage(UINT nMinPage)
 {
-  if (m_pPD != NULL) m_pPD->m_pd.nMinPage = static_cast<WORD>(nMinPage);
+    if (m_pPD != NULL)
+        m_pPD->m_pd.nMinPage = static_cast<WORD>(nMinPage);
 }
 
 void CPrintInfo::SetMaxPage(UINT nMaxPage)
 {
-  if (m_pPD != NULL) m_pPD->m_pd.nMaxPage = static_cast<WORD>(nMaxPage);
+    if (m_pPD != NULL)
+        m_pPD->m_pd.nMaxPage = static_cast<WORD>(nMaxPage);
 }
 
 UINT CPrintInfo::GetMinPage() const { return m_pPD == NULL ? 0 : m_pPD->m_pd.nMinPage; }

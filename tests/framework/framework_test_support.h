@@ -12,21 +12,22 @@ namespace framework_test {
 // paint) and returns without waiting for more.
 inline void DispatchPendingMessages()
 {
-  MSG msg;
-  while (::PeekMessageA(&msg, NULL, 0, 0, PM_REMOVE)) {
-    ::TranslateMessage(&msg);
-    ::DispatchMessageA(&msg);
-  }
+    MSG msg;
+    while (::PeekMessageA(&msg, NULL, 0, 0, PM_REMOVE)) {
+        ::TranslateMessage(&msg);
+        ::DispatchMessageA(&msg);
+    }
 }
 
 // Leaves no message and no temporary object behind for the next test.
-class WindowTest : public ::testing::Test {
+class WindowTest : public ::testing::Test
+{
 protected:
-  void TearDown() override
-  {
-    DispatchPendingMessages();
-    CWinThread().OnIdle(1);
-  }
+    void TearDown() override
+    {
+        DispatchPendingMessages();
+        CWinThread().OnIdle(1);
+    }
 };
 
 }  // namespace framework_test

@@ -13,12 +13,12 @@ BOOL g_attached = FALSE;
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE hInstance, DWORD dwReason, LPVOID)
 {
-  if (dwReason == DLL_PROCESS_ATTACH && !g_attached) {
-    g_attached = TRUE;
-    AfxInitExtensionModule(g_extensionModule, hInstance);
-    new CDynLinkLibrary(g_extensionModule);  // owned by the framework's chain
-  }
-  return TRUE;
+    if (dwReason == DLL_PROCESS_ATTACH && !g_attached) {
+        g_attached = TRUE;
+        AfxInitExtensionModule(g_extensionModule, hInstance);
+        new CDynLinkLibrary(g_extensionModule);  // owned by the framework's chain
+    }
+    return TRUE;
 }
 
 BOOL ExtensionLibraryAttached() { return g_attached; }
