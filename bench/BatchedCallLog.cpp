@@ -1,125 +1,107 @@
 #include "BatchedCallLog.h"
 
-#include "ImportPatch.h"
+#include "GdiCallRecorder.h"
 
-#include <memory>
+#include <algorithm>
 
-namespace {
+bool BatchedCallLog::Record(const std::function<void()>& pass)
+{
+    GdiCallRecorder recorder;
+    if (!recorder.IsActive())
+        return false;
+    pass();
+    m_ops.clear();
+    m_points.clear();
+    m_recordedSlots.clear();
+    for (const GdiCall& call : recorder.GetCalls()) {
+        if (!Add(call))
+            return false;
+    }
+    m_replaySlots.assign(m_recordedSlots.size(), nullptr);
+    return true;
+}
 
-BatchedCallLog* g_log = nullptr;
-
-struct Forwarders {
-    decltype(&PolyPolyline) polyPolyline = nullptr;
-    decltype(&Polygon) polygon = nullptr;
-    decltype(&Rectangle) rectangle = nullptr;
-    decltype(&Ellipse) ellipse = nullptr;
-    decltype(&SelectObject) selectObject = nullptr;
-    decltype(&CreatePen) createPen = nullptr;
-    decltype(&CreateBrushIndirect) createBrush = nullptr;
-    decltype(&DeleteObject) deleteObject = nullptr;
-    decltype(&SetTextColor) setTextColor = nullptr;
-} g_forward;
-
-using Op = BatchedCallLog::Op;
-
-Op MakeOp(BatchedCallLog::Code code, int a = 0, int b = 0, int c = 0, int d = 0)
+bool BatchedCallLog::Add(const GdiCall& call)
 {
     Op op;
-    op.code = code;
-    op.a = a;
-    op.b = b;
-    op.c = c;
-    op.d = d;
-    return op;
-}
-
-BOOL WINAPI RecordPolyPolyline(HDC dc, const POINT* points, const DWORD* counts, DWORD polylines)
-{
-    // The surface's batches hold polylines of one length each.
-    const int perPolyline = polylines > 0 ? static_cast<int>(counts[0]) : 2;
-    Op op = MakeOp(BatchedCallLog::PolyPolylineOp, static_cast<int>(polylines), perPolyline);
-    op.offset = g_log->AddPoints(points, static_cast<size_t>(polylines) * perPolyline);
-    g_log->AddOp(op);
-    NoteCounts(*g_log, perPolyline, static_cast<int>(polylines));
-    return g_forward.polyPolyline(dc, points, counts, polylines);
-}
-
-BOOL WINAPI RecordPolygon(HDC dc, const POINT* points, int count)
-{
-    Op op = MakeOp(BatchedCallLog::PolygonOp, count);
-    op.offset = g_log->AddPoints(points, static_cast<size_t>(count));
-    g_log->AddOp(op);
-    return g_forward.polygon(dc, points, count);
-}
-
-BOOL WINAPI RecordRectangle(HDC dc, int l, int t, int r, int b)
-{
-    g_log->AddOp(MakeOp(BatchedCallLog::RectangleOp, l, t, r, b));
-    return g_forward.rectangle(dc, l, t, r, b);
-}
-
-BOOL WINAPI RecordEllipse(HDC dc, int l, int t, int r, int b)
-{
-    g_log->AddOp(MakeOp(BatchedCallLog::EllipseOp, l, t, r, b));
-    return g_forward.ellipse(dc, l, t, r, b);
-}
-
-HGDIOBJ WINAPI RecordSelectObject(HDC dc, HGDIOBJ object)
-{
-    const int slot = g_log->FindSlot(object);
-    Op op = MakeOp(slot >= 0 ? BatchedCallLog::SelectCreatedOp : BatchedCallLog::SelectOtherOp, slot);
-    op.other = object; // a stock object or one the DC held before the pass
-    g_log->AddOp(op);
-    return g_forward.selectObject(dc, object);
-}
-
-HPEN WINAPI RecordCreatePen(int style, int width, COLORREF colour)
-{
-    HPEN pen = g_forward.createPen(style, width, colour);
-    g_log->AddOp(MakeOp(BatchedCallLog::CreatePenOp, g_log->NewSlot(pen), style, width, static_cast<int>(colour)));
-    return pen;
-}
-
-HBRUSH WINAPI RecordCreateBrushIndirect(const LOGBRUSH* description)
-{
-    HBRUSH brush = g_forward.createBrush(description);
-    g_log->AddOp(MakeOp(BatchedCallLog::CreateBrushOp, g_log->NewSlot(brush), static_cast<int>(description->lbStyle),
-                        static_cast<int>(description->lbColor)));
-    return brush;
-}
-
-BOOL WINAPI RecordDeleteObject(HGDIOBJ object)
-{
-    const int slot = g_log->FindSlot(object);
-    if (slot >= 0) {
-        g_log->AddOp(MakeOp(BatchedCallLog::DeleteCreatedOp, slot));
-        g_log->FreeSlot(slot);
+    switch (call.kind) {
+    case GdiCall::PolyPolyline: {
+        const std::vector<DWORD>& counts = call.countValues;
+        const int perPolyline = counts.empty() ? 2 : static_cast<int>(counts.front());
+        const bool uniform = std::all_of(counts.begin(), counts.end(),
+                                         [perPolyline](DWORD count) { return static_cast<int>(count) == perPolyline; });
+        if (!uniform || perPolyline > kMaxPointsPerPolyline)
+            return false;
+        op.code = PolyPolylineOp;
+        op.a = static_cast<int>(counts.size());
+        op.b = perPolyline;
+        op.offset = AddPoints(call.points);
+        NoteCounts(perPolyline, op.a);
+        break;
     }
-    return g_forward.deleteObject(object);
+    case GdiCall::Polygon:
+        op.code = PolygonOp;
+        op.a = static_cast<int>(call.points.size());
+        op.offset = AddPoints(call.points);
+        break;
+    case GdiCall::Rectangle:
+    case GdiCall::Ellipse:
+        op.code = call.kind == GdiCall::Rectangle ? RectangleOp : EllipseOp;
+        op.a = call.box[0];
+        op.b = call.box[1];
+        op.c = call.box[2];
+        op.d = call.box[3];
+        break;
+    case GdiCall::SelectObject:
+        op.a = FindSlot(call.object);
+        op.code = op.a >= 0 ? SelectCreatedOp : SelectOtherOp;
+        op.other = call.object; // a stock object or one the DC held before the pass
+        break;
+    case GdiCall::CreatePen:
+        op.code = CreatePenOp;
+        op.a = NewSlot(call.object);
+        op.b = static_cast<int>(call.value);
+        op.c = call.width;
+        op.d = static_cast<int>(call.colour);
+        break;
+    case GdiCall::CreateBrush:
+        op.code = CreateBrushOp;
+        op.a = NewSlot(call.object);
+        op.b = static_cast<int>(call.value);
+        op.c = static_cast<int>(call.colour);
+        break;
+    case GdiCall::DeleteObject:
+        op.code = DeleteCreatedOp;
+        op.a = FindSlot(call.object);
+        if (op.a < 0)
+            return true;
+        m_recordedSlots[static_cast<size_t>(op.a)] = nullptr;
+        break;
+    case GdiCall::SetTextColor:
+        op.code = SetTextColorOp;
+        op.a = static_cast<int>(call.colour);
+        break;
+    case GdiCall::TextOut:
+    case GdiCall::CreateFont:
+    case GdiCall::SetTextAlign:
+        return true;
+    }
+    m_ops.push_back(op);
+    return true;
 }
 
-COLORREF WINAPI RecordSetTextColor(HDC dc, COLORREF colour)
-{
-    g_log->AddOp(MakeOp(BatchedCallLog::SetTextColorOp, static_cast<int>(colour)));
-    return g_forward.setTextColor(dc, colour);
-}
-
-} // namespace
-
-void NoteCounts(BatchedCallLog& log, int pointsPerPolyline, int polylines)
-{
-    if (pointsPerPolyline < 0 || pointsPerPolyline > 5)
-        return;
-    std::vector<DWORD>& counts = log.m_counts[pointsPerPolyline];
-    if (static_cast<int>(counts.size()) < polylines)
-        counts.assign(static_cast<size_t>(polylines), static_cast<DWORD>(pointsPerPolyline));
-}
-
-size_t BatchedCallLog::AddPoints(const POINT* points, size_t count)
+size_t BatchedCallLog::AddPoints(const std::vector<POINT>& points)
 {
     const size_t offset = m_points.size();
-    m_points.insert(m_points.end(), points, points + count);
+    m_points.insert(m_points.end(), points.begin(), points.end());
     return offset;
+}
+
+void BatchedCallLog::NoteCounts(int pointsPerPolyline, int polylines)
+{
+    std::vector<DWORD>& counts = m_counts[pointsPerPolyline];
+    if (static_cast<int>(counts.size()) < polylines)
+        counts.assign(static_cast<size_t>(polylines), static_cast<DWORD>(pointsPerPolyline));
 }
 
 int BatchedCallLog::FindSlot(HGDIOBJ object) const
@@ -141,43 +123,6 @@ int BatchedCallLog::NewSlot(HGDIOBJ object)
     }
     m_recordedSlots.push_back(object);
     return static_cast<int>(m_recordedSlots.size() - 1);
-}
-
-bool BatchedCallLog::Record(const std::function<void()>& pass)
-{
-    const HMODULE module = GetModuleHandleA("libTavo_Windows.dll");
-    struct Entry {
-        const char* name;
-        void* replacement;
-        void** forward;
-    };
-    const Entry entries[] = {
-        {"PolyPolyline", reinterpret_cast<void*>(&RecordPolyPolyline), reinterpret_cast<void**>(&g_forward.polyPolyline)},
-        {"Polygon", reinterpret_cast<void*>(&RecordPolygon), reinterpret_cast<void**>(&g_forward.polygon)},
-        {"Rectangle", reinterpret_cast<void*>(&RecordRectangle), reinterpret_cast<void**>(&g_forward.rectangle)},
-        {"Ellipse", reinterpret_cast<void*>(&RecordEllipse), reinterpret_cast<void**>(&g_forward.ellipse)},
-        {"SelectObject", reinterpret_cast<void*>(&RecordSelectObject), reinterpret_cast<void**>(&g_forward.selectObject)},
-        {"CreatePen", reinterpret_cast<void*>(&RecordCreatePen), reinterpret_cast<void**>(&g_forward.createPen)},
-        {"CreateBrushIndirect", reinterpret_cast<void*>(&RecordCreateBrushIndirect),
-         reinterpret_cast<void**>(&g_forward.createBrush)},
-        {"DeleteObject", reinterpret_cast<void*>(&RecordDeleteObject), reinterpret_cast<void**>(&g_forward.deleteObject)},
-        {"SetTextColor", reinterpret_cast<void*>(&RecordSetTextColor), reinterpret_cast<void**>(&g_forward.setTextColor)},
-    };
-    std::vector<std::unique_ptr<ImportPatch>> patches;
-    for (const Entry& entry : entries) {
-        patches.push_back(std::make_unique<ImportPatch>(module, entry.name, entry.replacement));
-        if (!patches.back()->IsActive())
-            return false;
-        *entry.forward = patches.back()->GetOriginal();
-    }
-    m_ops.clear();
-    m_points.clear();
-    m_recordedSlots.clear();
-    g_log = this;
-    pass();
-    g_log = nullptr;
-    m_replaySlots.assign(m_recordedSlots.size(), nullptr);
-    return true;
 }
 
 void BatchedCallLog::Replay(HDC dc) const

@@ -62,7 +62,9 @@ HGDIOBJ WINAPI RecordSelectObject(HDC dc, HGDIOBJ object)
 HPEN WINAPI RecordCreatePen(int style, int width, COLORREF colour)
 {
     const HPEN pen = Forward<decltype(&CreatePen)>(GdiCall::CreatePen)(style, width, colour);
-    Note({GdiCall::CreatePen, {}, pen, 0, colour});
+    GdiCall call{GdiCall::CreatePen, {}, pen, static_cast<UINT>(style), colour};
+    call.width = width;
+    Note(std::move(call));
     return pen;
 }
 

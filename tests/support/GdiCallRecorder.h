@@ -24,8 +24,8 @@ struct GdiCall {
     std::array<int, 4> box = {};
     // SelectObject: the object selected. Create*: the object made. DeleteObject: the object.
     HGDIOBJ object = nullptr;
-    // CreateBrush: the style; CreateFont: the height; SetTextAlign: the flags;
-    // DeleteObject: whether the object went.
+    // CreatePen, CreateBrush: the style; CreateFont: the height; SetTextAlign:
+    // the flags; DeleteObject: whether the object went.
     UINT value = 0;
     COLORREF colour = 0;         // CreatePen, CreateBrush, SetTextColor
     HGDIOBJ displaced = nullptr; // SelectObject: the object it displaced
@@ -35,6 +35,7 @@ struct GdiCall {
     std::vector<POINT> points = {};
     const DWORD* counts = nullptr;
     std::vector<DWORD> countValues = {};
+    int width = 0; // CreatePen
 };
 
 class GdiCallRecorder {
