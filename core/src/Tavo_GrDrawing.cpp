@@ -246,9 +246,11 @@ bool TextMeets(const Tavo_GrDrawingData& data, const Tavo_GrLayerData& layer, ui
         return true;
     const Tavo_GrAttr& attr = data.attrs[item.attr];
     const int length = Tavo_GrSaturate(static_cast<long long>(std::strlen(data.texts.data() + item.count)));
+    const int height = attr.GetCharHeight();
+    const char align = attr.GetTextAlign();
     const Tavo_GrWRect extent = item.kind == Tavo_GrItemKind::Text
-        ? Tavo_GrText::PointExtent(bounds, data.points[item.points], attr.GetCharHeight(), length, attr.GetTextAlign(), floor)
-        : Tavo_GrText::BoxExtent(bounds, attr.GetCharHeight(), length, attr.GetTextAlign(), floor);
+        ? Tavo_GrText::PointExtent(bounds, data.points[item.points], height, length, align, floor)
+        : Tavo_GrText::BoxExtent(bounds, height, length, align, floor);
     return Tavo_GrIntersects(extent, clip);
 }
 

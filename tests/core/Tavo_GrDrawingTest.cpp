@@ -259,20 +259,28 @@ TEST_F(DrawingTest, TextIsFoundWhereTheSurfaceDrawsItOtherItemsByTheirBounds)
         void (*add)(Tavo_GrDrawingBuilder& build, const Tavo_GrDrawing& symbol);
     } items[] = {
         // 11 characters: 55 units nominally, 88 at the floor.
-        {"left 789012", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(340, 450, "left 789012"); }},
-        {"right 89012", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddText(560, 450, "right 89012"); }},
-        {"centre 9012", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kCentre}); b.AddText(540, 450, "centre 9012"); }},
-        {"far 5678901", false, false, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(300, 450, "far 5678901"); }},
+        {"left 789012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(340, 450, "left 789012"); }},
+        {"right 89012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddText(560, 450, "right 89012"); }},
+        {"centre 9012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kCentre}); b.AddText(540, 450, "centre 9012"); }},
+        {"far 5678901", false, false,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(300, 450, "far 5678901"); }},
         // Above the clip: 1.5 character heights below the baseline reach it only at the floor.
         {"above", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(420, 513, "above"); }},
         // Tall text below the clip: its cell may stand half a height above its nominal bounds.
         {"tall", true, true, [](auto& b, auto&) { b.SetAttr({0, 0, 20, kLeft}); b.AddText(420, 370, "tall"); }},
         // Right-aligned lines of a box are drawn left of it.
-        {"box right", true, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddTextBox({510, 440, 560, 460}, "box right"); }},
-        {"box left", false, false, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({510, 440, 560, 460}, "box left"); }},
+        {"box right", true, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddTextBox({510, 440, 560, 460}, "box right"); }},
+        {"box left", false, false,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({510, 440, 560, 460}, "box left"); }},
         // Cut text of a box above the clip: two lines below the box.
-        {"box near", true, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 508, 480, 530}, "box near"); }},
-        {"box above", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 515, 480, 530}, "box above"); }},
+        {"box near", true, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 508, 480, 530}, "box near"); }},
+        {"box above", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 515, 480, 530}, "box above"); }},
         {"called 1234", false, true, [](auto& b, auto& s) { b.AddCall(&s, 340, 450); }},
         // Other items just beyond the margin stay out; the one inside is in.
         {"Dot", false, false, [](auto& b, auto&) { b.AddDot(504, 450); }},
