@@ -113,7 +113,8 @@ void Tavo_WiDrawWnd::OnDragStart(UINT button, UINT flags, const CPoint& point)
         DoDragAndDrop(button, flags, point);
         break;
     case Pan: {
-        // At the zero level the whole drawing is in view: nothing to pan.
+        // At the zero level the whole drawing is in view, and without a
+        // drawing there is no view: nothing to pan.
         if (!m_zoomedIn || !m_mapping)
             break;
         CRect window(0, 0, 0, 0);
@@ -158,6 +159,7 @@ void Tavo_WiDrawWnd::OnDragMove(UINT, UINT, const CPoint& point)
 
 void Tavo_WiDrawWnd::OnTimer(UINT_PTR id)
 {
+    // A derived window's own timers are not autoscroll ticks.
     if (id != AutoScrollTimerId) {
         CWnd::OnTimer(id);
         return;
