@@ -9,6 +9,7 @@
 #include "Tavo_GrDrawingBuilder.h"
 #include "Tavo_WiDrawWnd.h"
 
+#include <functional>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -16,7 +17,8 @@
 namespace DrawWndTest {
 
 // A drawing window with its own on-screen surface (switched off with
-// useSurface) that notes the application notifications it receives.
+// useSurface) that notes the application notifications it receives, and the
+// ends of drags.
 class TestDrawWnd : public Tavo_WiDrawWnd
 {
 public:
@@ -26,6 +28,7 @@ public:
         UINT button = 0;
         UINT flags = 0;
         Tavo_GrWRect rect;
+        HWND capture = nullptr;     // the window holding the mouse capture at the call
     };
 
     Tavo_WiNativeWindowSurface surface;
@@ -34,6 +37,7 @@ public:
     DragAction dragAction = Pan;
     CString dataTipText;
     int paints = 0;     // passes of the full paint path that reached the drawing
+    std::function<void()> onPaint;  // run at each of those passes, before the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
 
@@ -41,11 +45,21 @@ public:
     using Tavo_WiDrawWnd::GetScrollDeviceDeltas;
     using Tavo_WiDrawWnd::SetDragScrollingFlag;
 
+    // Noted as "DragEnd" with the button, the flags and the point (as a
+    // one-point rectangle); then the window's own handling.
+    void OnDragEnd(UINT button, UINT flags, const CPoint& point, int completed) override
+    {
+        Note("DragEnd", button, flags, Tavo_GrWRect{point.x, point.y, point.x, point.y});
+        Tavo_WiDrawWnd::OnDragEnd(button, flags, point, completed);
+    }
+
 protected:
     void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc, Tavo_GrDrawing* drawing, Tavo_WiNativeWindowSurface* s,
                 Tavo_GrMapping* mapping, Tavo_GrDRect& rect) override
     {
         ++paints;
+        if (onPaint)
+            onPaint();
         Tavo_WiDrawWnd::OnDraw(scrollee, dc, drawing, s, mapping, rect);
     }
     using Tavo_WiDrawWnd::OnDraw;
@@ -75,7 +89,7 @@ protected:
 private:
     void Note(const char* name, UINT button, UINT flags, const Tavo_GrWRect& rect)
     {
-        notes.push_back({name, button, flags, rect});
+        notes.push_back({name, button, flags, rect, ::GetCapture()});
     }
 };
 
@@ -110,6 +124,10 @@ void PaintNow(HWND window);
 inline void PrintTo(const Tavo_GrWRect& r, std::ostream* out)
 {
     *out << "(" << r.x1 << ", " << r.y1 << ", " << r.x2 << ", " << r.y2 << ")";
+}
+inline void PrintTo(const CSize& s, std::ostream* out)
+{
+    *out << s.cx << " x " << s.cy;
 }
 inline void PrintTo(const Tavo_GrDRect& r, std::ostream* out)
 {
