@@ -1,6 +1,7 @@
 // The version of the DLLs: each one's version resource, read back with the
-// Win32 version API from the file the process loaded, carries the version of
-// Tavo_WiVersion.h, names its own file and describes itself.
+// Win32 version API from the file the process loaded, carries the project's
+// version (the one Tavo_WiVersion.h holds), names its own file and describes
+// itself.
 #include "Tavo_WiLibrary.h"
 #include "Tavo_WiVersion.h"
 
@@ -13,89 +14,61 @@
 
 namespace {
 
-// The project's version as CMake knows it, to check the generated header by.
-constexpr const char* kProjectVersion = TAVO_PROJECT_VERSION;
-
-struct VersionResource
-{
-    VS_FIXEDFILEINFO fixed = {};
-    std::vector<char> block;
-
-    // A string of the US English, Unicode table; empty when there is none.
-    std::string Text(const char* name)
-    {
-        const std::string path = std::string("\\StringFileInfo\\040904B0\\") + name;
-        char* value = nullptr;
-        UINT length = 0;
-        if (!VerQueryValueA(block.data(), path.c_str(), reinterpret_cast<void**>(&value), &length) || value == nullptr)
-            return {};
-        return std::string(value);
-    }
-};
-
 std::string LoadedPath(const char* dllName)
 {
     char path[MAX_PATH] = {};
     const HMODULE module = GetModuleHandleA(dllName);
-    if (module == nullptr || GetModuleFileNameA(module, path, MAX_PATH) == 0)
-        return {};
-    return path;
+    return module != nullptr && GetModuleFileNameA(module, path, MAX_PATH) != 0 ? path : "";
 }
 
-// False, with the reason noted by the test, when the file has no readable
-// version resource.
-bool ReadVersion(const std::string& path, VersionResource& out)
+// A string of the US English, Unicode table of a version block; empty when
+// there is none.
+std::string VersionText(std::vector<char>& block, const std::string& name)
 {
-    DWORD handle = 0;
-    const DWORD size = GetFileVersionInfoSizeA(path.c_str(), &handle);
-    if (size == 0)
-        return false;
-    out.block.resize(size);
-    if (!GetFileVersionInfoA(path.c_str(), 0, size, out.block.data()))
-        return false;
-    VS_FIXEDFILEINFO* fixed = nullptr;
+    char* value = nullptr;
     UINT length = 0;
-    if (!VerQueryValueA(out.block.data(), "\\", reinterpret_cast<void**>(&fixed), &length) || length < sizeof(*fixed))
-        return false;
-    out.fixed = *fixed;
-    return true;
+    const std::string path = "\\StringFileInfo\\040904B0\\" + name;
+    return VerQueryValueA(block.data(), path.c_str(), reinterpret_cast<void**>(&value), &length) && value != nullptr
+               ? value
+               : "";
 }
-
-constexpr DWORD kVersionHigh = MAKELONG(TAVO_VERSION_MINOR, TAVO_VERSION_MAJOR);
-constexpr DWORD kVersionLow = MAKELONG(0, TAVO_VERSION_PATCH);
 
 TEST(Version, TheGeneratedHeaderCarriesTheProjectVersion)
 {
-    EXPECT_STREQ(TAVO_VERSION_STRING, kProjectVersion);
+    EXPECT_STREQ(TAVO_VERSION_STRING, TAVO_PROJECT_VERSION);
     EXPECT_EQ(std::to_string(TAVO_VERSION_MAJOR) + "." + std::to_string(TAVO_VERSION_MINOR) + "." +
                   std::to_string(TAVO_VERSION_PATCH),
-              kProjectVersion);
-    EXPECT_EQ(TAVO_VERSION, TAVO_VERSION_MAJOR * 10000 + TAVO_VERSION_MINOR * 100 + TAVO_VERSION_PATCH);
+              TAVO_PROJECT_VERSION);
 }
 
 TEST(Version, EachDllCarriesTheVersionItsNameAndADescription)
 {
-    // Linking the library loads all three.
-    Tavo_WiLibrary::Initialize();
+    Tavo_WiLibrary::Initialize();  // the first call into the library: all three DLLs are loaded
+    const DWORD high = MAKELONG(TAVO_VERSION_MINOR, TAVO_VERSION_MAJOR);
+    const DWORD low = MAKELONG(0, TAVO_VERSION_PATCH);
     for (const char* dll : {"afx.dll", "libTavo_Core.dll", "libTavo_Windows.dll"}) {
         SCOPED_TRACE(dll);
         const std::string path = LoadedPath(dll);
-        ASSERT_FALSE(path.empty());
-        VersionResource version;
-        ASSERT_TRUE(ReadVersion(path, version)) << "no version resource in " << path;
+        DWORD handle = 0;
+        std::vector<char> block(GetFileVersionInfoSizeA(path.c_str(), &handle));
+        ASSERT_FALSE(block.empty()) << "no version resource in " << path;
+        ASSERT_TRUE(GetFileVersionInfoA(path.c_str(), 0, static_cast<DWORD>(block.size()), block.data()));
+        VS_FIXEDFILEINFO* fixed = nullptr;
+        UINT length = 0;
+        ASSERT_TRUE(VerQueryValueA(block.data(), "\\", reinterpret_cast<void**>(&fixed), &length));
+        ASSERT_GE(length, sizeof(*fixed));
 
-        EXPECT_EQ(version.fixed.dwSignature, static_cast<DWORD>(VS_FFI_SIGNATURE));
-        EXPECT_EQ(version.fixed.dwFileType, static_cast<DWORD>(VFT_DLL));
-        EXPECT_EQ(version.fixed.dwFileVersionMS, kVersionHigh);
-        EXPECT_EQ(version.fixed.dwFileVersionLS, kVersionLow);
-        EXPECT_EQ(version.fixed.dwProductVersionMS, kVersionHigh);
-        EXPECT_EQ(version.fixed.dwProductVersionLS, kVersionLow);
-
-        EXPECT_EQ(version.Text("FileVersion"), TAVO_VERSION_STRING);
-        EXPECT_EQ(version.Text("ProductVersion"), TAVO_VERSION_STRING);
-        EXPECT_EQ(version.Text("ProductName"), "libTavo_Windows");
-        EXPECT_EQ(version.Text("OriginalFilename"), dll);
-        EXPECT_FALSE(version.Text("FileDescription").empty());
+        EXPECT_EQ(fixed->dwSignature, static_cast<DWORD>(VS_FFI_SIGNATURE));
+        EXPECT_EQ(fixed->dwFileType, static_cast<DWORD>(VFT_DLL));
+        EXPECT_EQ(fixed->dwFileVersionMS, high);
+        EXPECT_EQ(fixed->dwFileVersionLS, low);
+        EXPECT_EQ(fixed->dwProductVersionMS, high);
+        EXPECT_EQ(fixed->dwProductVersionLS, low);
+        EXPECT_EQ(VersionText(block, "FileVersion"), TAVO_VERSION_STRING);
+        EXPECT_EQ(VersionText(block, "ProductVersion"), TAVO_VERSION_STRING);
+        EXPECT_EQ(VersionText(block, "ProductName"), "libTavo_Windows");
+        EXPECT_EQ(VersionText(block, "OriginalFilename"), dll);
+        EXPECT_FALSE(VersionText(block, "FileDescription").empty());
     }
     Tavo_WiLibrary::Terminate(false);
 }
