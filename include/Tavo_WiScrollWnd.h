@@ -44,6 +44,10 @@ public:
     virtual bool ScrollWindowTest(Tavo_WiScroll::Dir dir, Tavo_WiScroll::Amount amount, int n);
 
 private:
+    // Its own slot of the table (it takes a CRect, so it does not override
+    // the framework's Create); the framework's form stays reachable only
+    // through it, as before.
+    using CWnd::Create;
     virtual BOOL Create(LPCSTR className, LPCSTR windowName, DWORD style, const CRect& rect,
                         CWnd* parent, UINT id, CCreateContext* context);
 
