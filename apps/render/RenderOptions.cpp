@@ -23,13 +23,14 @@ bool ParseInt(const char* text, int lowest, int highest, int& value)
 
 const char* RenderUsage()
 {
-    return "usage: render [--width N] [--height N] [--zoom L] [--output FILE.png]\n"
-           "  Draws the built-in sample drawing through the GDI rendering surface into\n"
-           "  a 32-bit bitmap and writes it as a PNG.\n"
+    return "usage: render [--width N] [--height N] [--zoom L] [--dxf FILE.dxf] [--output FILE.png]\n"
+           "  Draws the built-in sample drawing (or a DXF drawing) through the GDI\n"
+           "  rendering surface into a 32-bit bitmap and writes it as a PNG.\n"
            "  --width, --height  picture size in pixels (default 1600 x 1000, at most\n"
            "                     16384 a side and 64 megapixels in all)\n"
            "  --zoom             zoom level about the drawing's centre: 0 fits the whole\n"
            "                     drawing, each 5 levels double the scale (default 0, at most 50)\n"
+           "  --dxf              import this ASCII DXF file and draw it instead\n"
            "  --output           the PNG file to write (default sample.png)\n";
 }
 
@@ -51,6 +52,9 @@ bool ParseRenderOptions(int argc, char** argv, RenderOptions& options, std::stri
             ok = ParseInt(value, 0, RenderOptions::kLargestZoom, options.zoom);
         else if (std::strcmp(name, "--output") == 0 && value && *value) {
             options.output = value;
+            ok = true;
+        } else if (std::strcmp(name, "--dxf") == 0 && value && *value) {
+            options.dxf = value;
             ok = true;
         } else {
             error = std::string("unknown option ") + name;

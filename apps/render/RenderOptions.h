@@ -14,6 +14,7 @@ struct RenderOptions {
     int height = kDefaultHeight;
     int zoom = 0;            // zoom level: 0 fits the whole drawing
     std::string output = "sample.png";
+    std::string dxf;         // a DXF file to draw instead of the sample drawing
     bool help = false;
 };
 
