@@ -30,12 +30,14 @@ public:
 
     Tavo_WiNativeWindowSurface surface;
     bool useSurface = true;
+    Tavo_WiWin32Surface* printSurface = nullptr;    // handed out by GetPrintSurface; not owned
     std::vector<Note> notes;
     DragAction dragAction = Pan;
     CString dataTipText;
     int paints = 0;     // passes of the full paint path that reached the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
+    Tavo_WiWin32Surface* GetPrintSurface() override { return printSurface; }
 
     // The protected and private parts the tests drive directly.
     using Tavo_WiDrawWnd::GetScrollDeviceDeltas;
