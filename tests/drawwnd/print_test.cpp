@@ -132,15 +132,10 @@ TEST(PrintMath, HeaderNamesThePageAndItsPlaceInTheGrid)
 
 // ---- the real dialog ------------------------------------------------------------
 
-// The page-range group of the print dialog as it stands.
-struct RangeGroup
-{
-    std::string first, last, all, current;
-    LONG lastRight = 0, allRight = 0, currentRight = 0;
-    bool currentChosen = false, allChosen = false;
-};
-
-RangeGroup ReadRangeGroup(HWND dialog)
+// The page-range group of a print dialog in one line: the page boxes, the
+// two relabelled buttons, whether their right edges line up with the last
+// page box, and whether the current-page choice is selected.
+std::string DescribeRangeGroup(HWND dialog)
 {
     const auto text = [dialog](int id) {
         char buffer[256] = {};
@@ -152,17 +147,13 @@ RangeGroup ReadRangeGroup(HWND dialog)
         ::GetWindowRect(::GetDlgItem(dialog, id), &rect);
         return rect.right;
     };
-    RangeGroup group;
-    group.first = text(Tavo_WiPrintDialog::FirstPageBoxId);
-    group.last = text(Tavo_WiPrintDialog::LastPageBoxId);
-    group.all = text(Tavo_WiPrintDialog::AllPagesButtonId);
-    group.current = text(Tavo_WiPrintDialog::CurrentPageButtonId);
-    group.lastRight = right(Tavo_WiPrintDialog::LastPageBoxId);
-    group.allRight = right(Tavo_WiPrintDialog::AllPagesButtonId);
-    group.currentRight = right(Tavo_WiPrintDialog::CurrentPageButtonId);
-    group.currentChosen = ::IsDlgButtonChecked(dialog, Tavo_WiPrintDialog::CurrentPageButtonId) == BST_CHECKED;
-    group.allChosen = ::IsDlgButtonChecked(dialog, Tavo_WiPrintDialog::AllPagesButtonId) == BST_CHECKED;
-    return group;
+    using Ids = Tavo_WiPrintDialog;
+    const LONG edge = right(Ids::LastPageBoxId);
+    const bool aligned = right(Ids::AllPagesButtonId) == edge && right(Ids::CurrentPageButtonId) == edge;
+    const bool current = ::IsDlgButtonChecked(dialog, Ids::CurrentPageButtonId) == BST_CHECKED;
+    return text(Ids::FirstPageBoxId) + " to " + text(Ids::LastPageBoxId) + " | " + text(Ids::AllPagesButtonId) +
+           " | " + text(Ids::CurrentPageButtonId) + (aligned ? " | aligned" : " | not aligned") +
+           (current ? " | current chosen" : " | current not chosen");
 }
 
 // Shows the real print dialog through the application; once it has been
@@ -210,26 +201,14 @@ TEST(PrintDialog, RelabelsThePageRangeGroupForTheGridAndChoosesTheCurrentPage)
     CPrintInfo onePage;
     unbound.OnPreparePrinting(&onePage);
 
-    struct Case
-    {
-        const char* name;
-        CPrintDialog* dialog;
-        const char *last, *all, *current;
-    };
-    const Case cases[] = {{"grid", &gridDialog, "30", "&All (6col, 5 row)", "C&urrent (Page 8)"},
-                          {"one page", onePage.m_pPD, "1", "&All (1col, 1 row)", "C&urrent (Page 1)"}};
-    for (const Case& c : cases) {
-        RangeGroup group;
-        EXPECT_EQ(DialogRun::Show(app, c.dialog, IDCANCEL, [&](HWND dialog) { group = ReadRangeGroup(dialog); }),
-                  IDCANCEL) << c.name;
-        EXPECT_EQ(group.first, "1") << c.name;
-        EXPECT_EQ(group.last, c.last) << c.name;
-        EXPECT_EQ(group.all, c.all) << c.name;
-        EXPECT_EQ(group.current, c.current) << c.name;
-        EXPECT_EQ(group.allRight, group.lastRight) << c.name;
-        EXPECT_EQ(group.currentRight, group.lastRight) << c.name;
-        EXPECT_TRUE(group.currentChosen) << c.name;
-        EXPECT_FALSE(group.allChosen) << c.name;
+    const std::pair<CPrintDialog*, const char*> cases[] = {
+        {&gridDialog, "1 to 30 | &All (6col, 5 row) | C&urrent (Page 8) | aligned | current chosen"},
+        {onePage.m_pPD, "1 to 1 | &All (1col, 1 row) | C&urrent (Page 1) | aligned | current chosen"}};
+    for (const auto& [dialog, expected] : cases) {
+        std::string group;
+        EXPECT_EQ(DialogRun::Show(app, dialog, IDCANCEL, [&](HWND shown) { group = DescribeRangeGroup(shown); }),
+                  IDCANCEL);
+        EXPECT_EQ(group, expected);
     }
 }
 
