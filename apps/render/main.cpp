@@ -1,9 +1,11 @@
 // render: draws the built-in sample drawing, or a DXF drawing, through the GDI
-// rendering surface into a 32-bit DIB section and writes it as a PNG.
+// rendering surface into a 32-bit DIB section and writes it as a PNG, or prints
+// the sample drawing's page grid on the default printer.
 #include "DibCanvas.h"
 #include "PngWriter.h"
 #include "RenderOptions.h"
 #include "SampleDrawing.h"
+#include "SamplePrintJob.h"
 
 #include "Tavo_DxfImport.h"
 #include "Tavo_DxfPaletteColours.h"
@@ -90,6 +92,23 @@ int Render(const RenderOptions& options)
     return 0;
 }
 
+int Print(const RenderOptions& options)
+{
+    Tavo_GrDrawing drawing;
+    BuildSampleDrawing(drawing);
+    SamplePrintResult result;
+    const std::string failure =
+        PrintSampleGrid(drawing, options.width, options.height, options.zoom, options.print, result);
+    if (!failure.empty()) {
+        std::fprintf(stderr, "render: printing to %s: %s\n", options.print.c_str(), failure.c_str());
+        return 1;
+    }
+    std::printf("render: printed %d pages (%d columns x %d rows, current page %d, zoom level %d) to %s\n",
+                result.pagesPrinted, result.columns, result.rows, result.currentPage, options.zoom,
+                options.print.c_str());
+    return 0;
+}
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -105,7 +124,7 @@ int main(int argc, char** argv)
         return 0;
     }
     Tavo_WiLibrary::Initialize();
-    const int status = Render(options);
+    const int status = options.print.empty() ? Render(options) : Print(options);
     Tavo_WiLibrary::Terminate(false);
     return status;
 }
