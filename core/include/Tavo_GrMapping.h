@@ -24,8 +24,11 @@
 // * Largest zoom. Levels are limited to the maximum zoom level (default 10 * n)
 //   and further so that the world clip box never becomes narrower or lower than
 //   the largest-zoom world clip box size (SetMaxZoomWorldClipBoxSize; 0 on an
-//   axis: no limit on that axis). The limit from the box may be a level between
-//   whole levels.
+//   axis: no limit on that axis), and so that the scale never exceeds kMaxScale:
+//   there one world unit spans the whole int range of device pixels, every
+//   device coordinate but one saturates, and nothing more can be shown (an
+//   absurd maximum level would otherwise take the scale to infinity). The
+//   limits from the box and the scale may be levels between whole levels.
 // * Zoom types (Tavo_GrZoom::Type), for Zoom(type, x, y, amount) and
 //   ChangesZoomLevel(type, amount):
 //       ZeroLevel (-2)  go to level 0: the fit; amount and centre are ignored
@@ -42,7 +45,8 @@
 //   view). Without the force flag and above the zero level it keeps the scale
 //   and the world point at the top-left corner: the window shows more or less of
 //   the drawing, and the real level follows the scale (when that would bring it
-//   to 0 or below, the view becomes the zero level).
+//   to 0 or below, the view becomes the zero level; above the largest zoom, the
+//   scale becomes the largest zoom's, the top-left corner still staying).
 // * Panning. PanTo(p) moves the view, at the same scale, so that the world
 //   point p is at the top-left corner of the device window (where a scroll
 //   window's scroll position is).
@@ -78,6 +82,7 @@ struct Tavo_GrZoom {
 class TAVO_CORE_API Tavo_GrMapping {
 public:
     static constexpr int kDefaultMaxZoomLevelsPerStep = 10; // default max level = 10 * n
+    static constexpr double kMaxScale = 2147483647.0;          // device pixels per world unit at most
 
     // drawing: shown, not owned (null: an empty drawing). levelsPerDoubling: n above.
     Tavo_GrMapping(const Tavo_GrDrawing* drawing, int levelsPerDoubling);

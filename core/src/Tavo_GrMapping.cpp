@@ -74,6 +74,18 @@ int Tavo_GrMapping::SetDeviceWindowSize(int width, int height, bool force, const
         ApplyLevel(0.0, cx, cy);
         return 1;
     }
+    // A window that shrank at the largest zoom would show more than the
+    // largest level allows: the scale comes down to that level's, and the
+    // top-left corner still stays.
+    const double largest = LargestLevel();
+    if (level > largest) {
+        SetRealLevel(largest);
+        m_transform.m_scale = ScaleOfLevel(m_realZoomLevel);
+        m_transform.m_xError = 0.0;
+        m_transform.m_yError = 0.0;
+        m_transform.m_yOrigin = topY - m_deviceHeight / m_transform.m_scale;
+        return 1;
+    }
     m_transform.m_yOrigin = topY - (m_deviceHeight - m_transform.m_yError) / s;
     SetRealLevel(level);
     return 1;
@@ -213,7 +225,7 @@ double Tavo_GrMapping::LevelOfScale(double scale) const
 
 double Tavo_GrMapping::LargestLevel() const
 {
-    double largest = m_maxZoomLevel;
+    double largest = std::min(static_cast<double>(m_maxZoomLevel), LevelOfScale(kMaxScale));
     if (m_maxClipWidth > 0 && m_deviceWidth > 0)
         largest = std::min(largest, LevelOfScale(static_cast<double>(m_deviceWidth) / m_maxClipWidth));
     if (m_maxClipHeight > 0 && m_deviceHeight > 0)

@@ -5,6 +5,7 @@
 #include "Tavo_WiDrawWnd.h"
 
 #include "Tavo_GrRound.h"
+#include "Tavo_WiViewMath.h"
 
 BEGIN_MESSAGE_MAP(Tavo_WiDrawWnd, Tavo_WiScrollWnd)
     ON_WM_WINDOWPOSCHANGED()
@@ -219,10 +220,17 @@ void Tavo_WiDrawWnd::OnExitSizeMove()
         return;
     }
     // Zoomed in: the scale and the top-left world point stay; the window
-    // shows more or less of the drawing.
+    // shows more or less of the drawing. The mapping is sized and panned
+    // there first, as the next paint does, so that the extent is read from
+    // the view that will be shown: a view elsewhere could lie partly beyond
+    // the int range, where its corners are cut and its size with them.
+    m_mapping->SetDeviceWindowSize(size.cx, size.cy, false, nullptr);
+    m_mapping->PanTo(Tavo_GrWPoint{m_savedPoint.x, m_savedPoint.y});
     const Tavo_GrWRect visible = VisibleWorldRect(size.cx, size.cy);
-    SetScrollWindowExtent(Tavo_GrSaturate(static_cast<long long>(visible.x2) - visible.x1),
-                          Tavo_GrSaturate(static_cast<long long>(visible.y2) - visible.y1));
+    const double scale = m_mapping->GetTransform().GetScale();
+    SetScrollWindowExtent(
+        Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(visible.x1, visible.x2, size.cx, scale)),
+        Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(visible.y1, visible.y2, size.cy, scale)));
     SetScrollPosition(m_savedPoint);
     SetScrollDone();
     CWnd::InvalidateRect(nullptr, TRUE);

@@ -12,6 +12,7 @@
 #include "Tavo_GrTypes.h"
 
 #include <algorithm>
+#include <climits>
 #include <cmath>
 
 namespace Tavo_WiViewMath {
@@ -42,6 +43,19 @@ inline Tavo_GrWRect Union(const Tavo_GrWRect& a, const Tavo_GrWRect& b)
     return {std::min(a.x1, b.x1), std::min(a.y1, b.y1), std::max(a.x2, b.x2), std::max(a.y2, b.y2)};
 }
 
+// The length of one side of a view `pixels` device pixels long, its corners
+// low and high: high - low, except where the view reaches beyond the int
+// range and a corner is cut at its end; then the view's own length, pixels /
+// S rounded, as far as an int holds it.
+inline long long ViewSideLength(int low, int high, int pixels, double scale)
+{
+    if (low != INT_MIN && high != INT_MAX)
+        return std::max(0LL, static_cast<long long>(high) - low);
+    if (pixels <= 0 || !IsUsableScale(scale))
+        return 0;
+    return std::min(std::floor(pixels / scale + 0.5), static_cast<double>(INT_MAX));
+}
+
 inline Tavo_GrWRect Offset(const Tavo_GrWRect& r, long long dx, long long dy)
 {
     return {Tavo_GrAdd(r.x1, dx), Tavo_GrAdd(r.y1, dy), Tavo_GrAdd(r.x2, dx), Tavo_GrAdd(r.y2, dy)};
@@ -61,20 +75,28 @@ struct ScrollRange
 // length of 100 pixels on the left and right, 3m/2 below and m/2 above, so
 // the drawing can be scrolled a little past its edges. At the zero level the
 // view stands at the top-left corner of the range: its left and top come
-// from V alone.
+// from V alone; and the range is no wider or higher than INT_MAX, the most a
+// scroll extent holds, so that a view wider than that (the whole int range
+// and more) cannot be scrolled at the zero level either.
 inline ScrollRange ScrollRangeFor(const Tavo_GrWRect& bounds, const Tavo_GrWRect& visible, double scale,
                                   bool zoomedIn)
 {
     const Tavo_GrWRect u = Union(bounds, visible);
-    if (!zoomedIn)
-        return {visible.x1, u.x2, u.y1, visible.y2};
+    if (!zoomedIn) {
+        const long long width = std::min<long long>(static_cast<long long>(u.x2) - visible.x1, INT_MAX);
+        const long long height = std::min<long long>(static_cast<long long>(visible.y2) - u.y1, INT_MAX);
+        return {visible.x1, Tavo_GrAdd(visible.x1, width), Tavo_GrSubtract(visible.y2, height), visible.y2};
+    }
     const long long m = IsUsableScale(scale) ? Tavo_GrRound(100.0 / scale) : 0;
     return {Tavo_GrSubtract(u.x1, m), Tavo_GrAdd(u.x2, m), Tavo_GrSubtract(u.y1, (3 * m) / 2),
             Tavo_GrAdd(u.y2, m / 2)};
 }
 
 // A world delta in device pixels, rounded, with what the rounding left over
-// (rounded minus exact), which the mapping keeps as its error term.
+// (rounded minus exact), which the mapping keeps as its error term. A delta
+// beyond the int range saturates; the pixels then all leave the window and
+// are painted anew, so only the rounding to a whole pixel is an error, never
+// the part cut off by the saturation.
 struct DeviceDelta
 {
     int pixels = 0;
@@ -86,8 +108,8 @@ inline DeviceDelta ToDeviceDelta(long long worldDelta, double scale)
     const double exact = static_cast<double>(worldDelta) * scale;
     if (!std::isfinite(exact))
         return {};
-    const int pixels = Tavo_GrRound(exact);
-    return {pixels, pixels - exact};
+    const double rounded = exact < 0.0 ? std::ceil(exact - 0.5) : std::floor(exact + 0.5);
+    return {Tavo_GrRound(exact), rounded - exact};
 }
 
 // A device delta in world units: 0 stays 0, anything else moves at least one
