@@ -7,6 +7,22 @@
 #include "Tavo_GrRound.h"
 #include "Tavo_WiViewMath.h"
 
+#include <cstdlib>
+
+namespace {
+
+// The size in world units of the view a mapping shows in an area, as far as
+// an int holds it.
+CSize ViewExtent(const Tavo_GrMapping& mapping, const CSize& area)
+{
+    const Tavo_GrWRect view = mapping.GetTransform().InvertRect(Tavo_GrDRect{0, 0, area.cx, area.cy});
+    const double scale = mapping.GetTransform().GetScale();
+    return CSize(Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(view.x1, view.x2, area.cx, scale)),
+                 Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(view.y1, view.y2, area.cy, scale)));
+}
+
+}  // namespace
+
 BEGIN_MESSAGE_MAP(Tavo_WiDrawWnd, Tavo_WiScrollWnd)
     ON_WM_WINDOWPOSCHANGED()
     ON_WM_TIMER()
@@ -212,26 +228,43 @@ void Tavo_WiDrawWnd::OnExitSizeMove()
     if (!m_drawing || !m_mapping || !IsShownWindow())
         return;
     const CSize size = GetScrolleeSize();
-    if (size == m_savedSize)
+    const Tavo_GrWRect before = m_mapping->GetWorldClipBox();
+    // Zoomed in, the mapping is sized to the new area first, as the next
+    // paint would size it: the scale and the top-left world point stay, and
+    // a window that grew until the whole drawing fits at that scale shows
+    // the zero level.
+    if (GetZoomLevel() != 0.0)
+        m_mapping->SetDeviceWindowSize(size.cx, size.cy, false, nullptr);
+    // A resize that ends at the size it began at changes nothing, unless a
+    // paint on the way changed the scale (a window grown until the drawing
+    // fitted, or shrunk below the largest zoom's clip box): then the view
+    // no longer has the extent of the scroll model.
+    const CSize extent = ViewExtent(*m_mapping, size);
+    if (size == m_savedSize && std::abs(extent.cx - GetWindowExtent().cx) <= 1 &&
+        std::abs(extent.cy - GetWindowExtent().cy) <= 1)
         return;
     if (GetZoomLevel() == 0.0) {
-        m_undoClipBox = m_mapping->GetWorldClipBox();
+        m_undoClipBox = before;
         InternalZoom(Tavo_GrZoom::ZeroLevel, 1, nullptr, true);
         return;
     }
-    // Zoomed in: the scale and the top-left world point stay; the window
-    // shows more or less of the drawing. The mapping is sized and panned
-    // there first, as the next paint does, so that the extent is read from
-    // the view that will be shown: a view elsewhere could lie partly beyond
-    // the int range, where its corners are cut and its size with them.
-    m_mapping->SetDeviceWindowSize(size.cx, size.cy, false, nullptr);
-    m_mapping->PanTo(Tavo_GrWPoint{m_savedPoint.x, m_savedPoint.y});
-    const Tavo_GrWRect visible = VisibleWorldRect(size.cx, size.cy);
-    const double scale = m_mapping->GetTransform().GetScale();
-    SetScrollWindowExtent(
-        Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(visible.x1, visible.x2, size.cx, scale)),
-        Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(visible.y1, visible.y2, size.cy, scale)));
-    SetScrollPosition(m_savedPoint);
+    // The window shows more or less of the drawing from the same top-left
+    // point. The view is panned there, as the next paint does, so that the
+    // extent is read from the view that will be shown: a view elsewhere
+    // could lie partly beyond the int range, where its corners are cut.
+    const auto showFromSavedPoint = [this](const CSize& area) {
+        m_mapping->PanTo(Tavo_GrWPoint{m_savedPoint.x, m_savedPoint.y});
+        const CSize shown = ViewExtent(*m_mapping, area);
+        SetScrollWindowExtent(shown.cx, shown.cy);
+        SetScrollPosition(m_savedPoint);
+    };
+    showFromSavedPoint(size);
     SetScrollDone();
+    // A bar that appeared or went changes the area, as in InternalZoom.
+    const CSize laidOut = GetScrolleeSize();
+    if (laidOut != size && laidOut.cx > 0 && laidOut.cy > 0) {
+        m_mapping->SetDeviceWindowSize(laidOut.cx, laidOut.cy, false, nullptr);
+        showFromSavedPoint(laidOut);
+    }
     CWnd::InvalidateRect(nullptr, TRUE);
 }

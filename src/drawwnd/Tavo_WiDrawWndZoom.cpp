@@ -14,12 +14,6 @@ int Clamped(long long value)
     return Tavo_GrSaturate(value);
 }
 
-// Derivations of the scroll model at most, one per layout of the bars.
-// Zoomed in the bars stay after the first (the range exceeds the view by its
-// margins); at the zero level a view of a few world units, whose corners
-// round to whole units, may need three to settle.
-constexpr int LayoutPasses = 4;
-
 }  // namespace
 
 void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force)
@@ -57,32 +51,33 @@ void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPo
                                           static_cast<long long>(worldCentre.y) - now.y));
     }
 
-    // The bars are laid out for the new range at the end, and a bar that
-    // appears or goes changes the scrollee's size: the view is then sized to
-    // the area it really has and the model derived again, until the layout
-    // stays.
-    CSize shown = size;
-    for (int pass = 0; pass < LayoutPasses; ++pass) {
-        visible = VisibleWorldRect(shown.cx, shown.cy);
+    // The scroll model of the view shown in an area of the given size.
+    const auto derive = [&](const CSize& area) {
+        visible = VisibleWorldRect(area.cx, area.cy);
         const bool zoomedIn = GetZoomLevel() != 0.0;
         m_zoomedIn = zoomedIn ? 1 : 0;
-        const ScrollRange range = ScrollRangeFor(bounds, visible, m_mapping->GetTransform().GetScale(), zoomedIn);
+        const double scale = m_mapping->GetTransform().GetScale();
+        const ScrollRange range = ScrollRangeFor(bounds, visible, scale, zoomedIn);
         SetScrollRange(range.xMin, range.xMax, range.yMin, range.yMax);
 
-        const double scale = m_mapping->GetTransform().GetScale();
-        const long long width = ViewSideLength(visible.x1, visible.x2, shown.cx, scale);
-        const long long height = ViewSideLength(visible.y1, visible.y2, shown.cy, scale);
+        const long long width = ViewSideLength(visible.x1, visible.x2, area.cx, scale);
+        const long long height = ViewSideLength(visible.y1, visible.y2, area.cy, scale);
         SetScrollDeltas(CSize(Clamped(width / 2), Clamped(height / 2)),
                         CSize(Clamped(width / 10), Clamped(height / 10)));
         SetScrollWindowExtent(Clamped(width), Clamped(height));
         SetScrollPosition(CPoint(visible.x1, visible.y2));
-        SetScrollDone();
-
-        const CSize laidOut = GetScrolleeSize();
-        if (laidOut == shown || laidOut.cx <= 0 || laidOut.cy <= 0)
-            break;
-        shown = laidOut;
-        m_mapping->SetDeviceWindowSize(shown.cx, shown.cy, false, nullptr);
+    };
+    derive(size);
+    SetScrollDone();
+    // Laying out the bars for the new range can change the scrollee's size
+    // (a bar appeared or went): the view is then sized to the area it really
+    // has and the model derived again, the bars staying as they are. Laid
+    // out again they could flip back: a view whose corners round to whole
+    // units may measure a pixel more than its area.
+    const CSize laidOut = GetScrolleeSize();
+    if (laidOut != size && laidOut.cx > 0 && laidOut.cy > 0) {
+        m_mapping->SetDeviceWindowSize(laidOut.cx, laidOut.cy, false, nullptr);
+        derive(laidOut);
     }
 
     if (changed || force)

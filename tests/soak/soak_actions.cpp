@@ -39,6 +39,8 @@ constexpr int Weights[ActionCount] = {
 // Device contexts the warm-up takes at once, to grow the system's cache of
 // them beyond what the library ever takes at once.
 constexpr int DeviceContextCache = 24;
+// Points tried for one in a view that the view itself shows.
+constexpr int PointAttempts = 8;
 // Time between two interactions, far beyond the double-click time.
 constexpr DWORD InteractionGap = 2000;
 // Time between the events of one interaction.
@@ -468,10 +470,11 @@ void Engine::DoDrag(SoakHost& host, Tavo_WiDrawWnd::DragAction action, bool stea
     const Button& button = m_random.Pick(Buttons);
     Trace(" action %d button %u from (%ld, %ld)", wnd.dragAction, button.flag, at.x, at.y);
 
-    Mouse(button.down, at, InteractionGap);
     // The press has been held long enough: the drag starts.
-    if (m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId))
+    if (m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId)) {
+        Trace(" held");
         ::SendMessageA(host.Scrollee(), WM_TIMER, Tavo_WiScrollee::HoldTimerId, 0);
+    }
     Pump();
 
     const int moves = m_random.Between(1, 8);
@@ -500,6 +503,7 @@ void Engine::DoDrag(SoakHost& host, Tavo_WiDrawWnd::DragAction action, bool stea
     }
     POINT last = {0, 0};
     ::GetCursorPos(&last);
+    Trace(" up at (%ld, %ld)%s", last.x, last.y, m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId) ? " (hold timer runs)" : "");
     Mouse(button.up, last, EventGap);
     // The window that took the capture gives it back.
     if (::GetCapture() == thief->Handle())
@@ -741,11 +745,15 @@ bool Engine::PointIn(SoakHost& host, POINT& screen)
     CRect client(0, 0, 0, 0);
     if (!host.IsAlive() || !::GetClientRect(host.Scrollee(), &client) || client.IsRectEmpty())
         return false;
-    screen = {m_random.Below(client.Width()), m_random.Below(client.Height())};
-    ::ClientToScreen(host.Scrollee(), &screen);
-    // Only what lies on the screen can be pointed at.
-    return screen.x >= 0 && screen.y >= 0 && screen.x < ::GetSystemMetrics(SM_CXSCREEN) &&
-           screen.y < ::GetSystemMetrics(SM_CYSCREEN);
+    // Only a point where the scrollee itself is on the screen can be pointed
+    // at: its frame may cut it off, the screen's edge, or another window.
+    for (int attempt = 0; attempt < PointAttempts; ++attempt) {
+        screen = {m_random.Below(client.Width()), m_random.Below(client.Height())};
+        ::ClientToScreen(host.Scrollee(), &screen);
+        if (::WindowFromPoint(screen) == host.Scrollee())
+            return true;
+    }
+    return false;
 }
 
 POINT Engine::PointOnScreen()

@@ -142,13 +142,16 @@ std::string Engine::CheckWindow(SoakHost& host)
             return "at the zero level the view " + Describe(clip) + " leaves out part of the drawing";
     }
     // Zoomed in, the mapping follows the scroll position: the view's
-    // top-left corner is the position, moved by what the error terms say the
-    // scrolled pixels are off.
+    // top-left corner lies where the position puts it, as far as the error
+    // terms (what the scrolled pixels are off) and a pixel more allow, and a
+    // unit for the rounding of the corner.
     if (level > 0.0) {
         const Tavo_GrTransform& t = mapping->GetTransform();
-        const int left = Tavo_GrRound(position.x - t.GetXError() / scale);
-        const int top = Tavo_GrRound(position.y - t.GetYError() / scale);
-        if (std::llabs(static_cast<long long>(clip.x1) - left) > 1 || std::llabs(static_cast<long long>(clip.y2) - top) > 1)
+        const auto nearPosition = [scale](int corner, long long position, double error) {
+            const double allowed = (std::fabs(error) + 1.0) / scale + 1.0;
+            return std::fabs(static_cast<double>(corner) - Tavo_GrRound(static_cast<double>(position))) <= allowed;
+        };
+        if (!nearPosition(clip.x1, position.x, t.GetXError()) || !nearPosition(clip.y2, position.y, t.GetYError()))
             return Format("scroll position (%ld, %ld) with error terms (%g, %g) but the view's top-left corner is "
                           "(%d, %d)", position.x, position.y, t.GetXError(), t.GetYError(), clip.x1, clip.y2);
     }
