@@ -136,7 +136,9 @@ public:
     // ---- binding and access -------------------------------------------------------
     // Binds a drawing (not owned) and shows it at the zero level, or unbinds
     // with null. The mapping gets the largest zoom level, the zero-level
-    // expansion (percent) and the largest-zoom world clip box size.
+    // expansion (percent) and the largest-zoom world clip box size. When
+    // there is no memory for the mapping the window stays unbound
+    // (GetDrawing() gives null).
     void SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, int surfaceOption,
                         int zeroLevelExpansion, unsigned int maxClipWidth,
                         unsigned int maxClipHeight);

@@ -69,15 +69,15 @@ int Tavo_GrMapping::SetDeviceWindowSize(int width, int height, bool force, const
     }
     // Keep the scale and the top-left corner: the window shows more or less.
     // Once the whole drawing fits at that scale, the view is the zero level.
+    // A window that shrank at the largest zoom would show more than the
+    // largest level allows: the scale comes down to that level's, and the
+    // top-left corner still stays (unless that is the zero level).
+    const double largest = LargestLevel();
     const double level = LevelOfScale(s);
-    if (level <= 0.0) {
+    if (level <= 0.0 || largest <= 0.0) {
         ApplyLevel(0.0, cx, cy);
         return 1;
     }
-    // A window that shrank at the largest zoom would show more than the
-    // largest level allows: the scale comes down to that level's, and the
-    // top-left corner still stays.
-    const double largest = LargestLevel();
     if (level > largest) {
         SetRealLevel(largest);
         m_transform.m_scale = ScaleOfLevel(m_realZoomLevel);

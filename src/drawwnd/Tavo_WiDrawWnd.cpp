@@ -8,6 +8,7 @@
 #include "Tavo_WiViewMath.h"
 
 #include <cstdlib>
+#include <new>
 
 namespace {
 
@@ -46,11 +47,15 @@ void Tavo_WiDrawWnd::SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, i
                                     unsigned int maxClipHeight)
 {
     m_mapping.reset();
-    m_drawing = drawing;
+    m_drawing = nullptr;
     if (!drawing)
         return;
     m_surfaceOption = surfaceOption;
-    m_mapping = std::make_unique<Tavo_GrMapping>(drawing, ZoomLevelsPerDoubling);
+    // Without memory for the mapping the window stays unbound, and usable.
+    m_mapping.reset(new (std::nothrow) Tavo_GrMapping(drawing, ZoomLevelsPerDoubling));
+    if (!m_mapping)
+        return;
+    m_drawing = drawing;
     m_mapping->SetMaxZoomLevel(maxZoomLevel);
     m_mapping->SetZeroLevelExpansion(zeroLevelExpansion);
     m_mapping->SetMaxZoomWorldClipBoxSize(maxClipWidth, maxClipHeight);
@@ -238,12 +243,13 @@ void Tavo_WiDrawWnd::OnExitSizeMove()
     // A resize that ends at the size it began at changes nothing, unless a
     // paint on the way changed the scale (a window grown until the drawing
     // fitted, or shrunk below the largest zoom's clip box): then the view
-    // no longer has the extent of the scroll model.
+    // is no longer the one the scroll model was derived from.
     const CSize extent = ViewExtent(*m_mapping, size);
-    if (size == m_savedSize && std::abs(extent.cx - GetWindowExtent().cx) <= 1 &&
+    const bool zoomedIn = GetZoomLevel() != 0.0;
+    if (size == m_savedSize && zoomedIn == (m_zoomedIn != 0) && std::abs(extent.cx - GetWindowExtent().cx) <= 1 &&
         std::abs(extent.cy - GetWindowExtent().cy) <= 1)
         return;
-    if (GetZoomLevel() == 0.0) {
+    if (!zoomedIn) {
         m_undoClipBox = before;
         InternalZoom(Tavo_GrZoom::ZeroLevel, 1, nullptr, true);
         return;
@@ -260,10 +266,16 @@ void Tavo_WiDrawWnd::OnExitSizeMove()
     };
     showFromSavedPoint(size);
     SetScrollDone();
-    // A bar that appeared or went changes the area, as in InternalZoom.
+    // A bar that appeared or went changes the area, as in InternalZoom; an
+    // area that grew so may show the whole drawing at this scale.
     const CSize laidOut = GetScrolleeSize();
     if (laidOut != size && laidOut.cx > 0 && laidOut.cy > 0) {
         m_mapping->SetDeviceWindowSize(laidOut.cx, laidOut.cy, false, nullptr);
+        if (GetZoomLevel() == 0.0) {
+            m_undoClipBox = before;
+            InternalZoom(Tavo_GrZoom::ZeroLevel, 1, nullptr, true);
+            return;
+        }
         showFromSavedPoint(laidOut);
     }
     CWnd::InvalidateRect(nullptr, TRUE);

@@ -181,7 +181,9 @@ void Tavo_WiDrawWnd::OnTimer(UINT_PTR id)
     const int m = AutoScrollPercent(m_savedPoint.y, m_savedSize.cy);
     ScrollStep(*this, m_savedPoint.y < 0 ? m * forward : -m * forward, Tavo_WiScroll::Down, Tavo_WiScroll::Up);
 
-    if ((n != 0 || m != 0) && m_panDrag)
+    // The paints of the steps may have destroyed the window; a timer set
+    // then would belong to no window, a thread timer nothing ever kills.
+    if ((n != 0 || m != 0) && m_panDrag && ::IsWindow(GetSafeHwnd()))
         m_autoScrollTimerId = static_cast<UINT>(SetTimer(AutoScrollTimerId, AutoScrollPeriodMs, nullptr));
 }
 
@@ -228,6 +230,10 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
     if (endMessage == 0)
         return;
     Tavo_WiScrollee* scrollee = GetScrollee();
+    // A paint the loop dispatches may destroy the window; the handles taken
+    // now still tell then, where the objects' own read null.
+    const HWND self = GetSafeHwnd();
+    const HWND view = scrollee->GetSafeHwnd();
     CClientDC dc(scrollee);
     SetCapture();
     CPoint last = start;
@@ -250,6 +256,8 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
             // The outline is drawn in XOR, so it is taken off around the paint.
             dc.DrawFocusRect(&rect);
             ::DispatchMessageA(&msg);
+            if (!::IsWindow(view))
+                break;
             dc.DrawFocusRect(&rect);
         } else if (msg.message == endMessage) {
             completed = true;
@@ -265,16 +273,22 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
                 last = current;
             }
         }
-        if (::GetCapture() != GetSafeHwnd())
+        if (::GetCapture() != self || !::IsWindow(self))
             break;
     }
-    dc.DrawFocusRect(&rect);
+    // A window destroyed meanwhile took its device context with it: the
+    // handle may already serve another window and is left alone.
+    const bool alive = ::IsWindow(view) != FALSE;
+    if (alive)
+        dc.DrawFocusRect(&rect);
+    else
+        dc.Detach();
     // After a cancellation the capture belongs to the window that took it;
     // ReleaseCapture would take it from that window as well.
-    if (::GetCapture() == GetSafeHwnd())
+    if (::GetCapture() == self)
         ::ReleaseCapture();
 
-    if (!completed || !m_drawing || !m_mapping)
+    if (!completed || !alive || !m_drawing || !m_mapping)
         return;
     const int h = m_mapping->GetDeviceWindowHeight();
     const Tavo_GrDRect device{rect.left, Tavo_GrSubtract(h, rect.bottom), rect.right, Tavo_GrSubtract(h, rect.top)};

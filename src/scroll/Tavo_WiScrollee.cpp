@@ -276,8 +276,13 @@ void Tavo_WiScrollee::OnXButtonDblClk(UINT button, UINT flags, const CPoint& poi
         scrollWnd->OnDoubleClick(button, flags, point);
 }
 
-void Tavo_WiScrollee::OnCaptureChanged(CWnd*)
+void Tavo_WiScrollee::OnCaptureChanged(CWnd* window)
 {
+    // The system reports a capture taken again by the window that holds it
+    // (the hold timer's SetCapture after the application took it for the
+    // scrollee) as a change; nothing is lost then.
+    if (window == this)
+        return;
     m_capture = 0;
     if (m_dragging) {
         if (Tavo_WiScrollWnd* scrollWnd = GetScrollWnd())

@@ -12,6 +12,7 @@
 #include "Tavo_GrRound.h"
 #include "UT_STR.h"
 
+#include <algorithm>
 #include <cstring>
 
 #pragma push_macro("DrawText")
@@ -30,6 +31,10 @@ const char kThickenVerticalLineVariable[] = "BRY_VWR_THICKENVERTICALLINE";
 const char kMinFontVariable[] = "BRY_VWR_MINFONT";
 // Fonts below this many pixels are never created: text becomes a placeholder.
 const unsigned int kSmallestFontPixels = 3;
+// Nor fonts taller than twice the device window (and than this many pixels):
+// none of their characters can be seen whole, and the font engine takes
+// seconds to draw one at a hundred thousand pixels.
+const unsigned int kLargestFontFloorPixels = 2048;
 
 // The GDI text-alignment flags of a graphics-core alignment code (bits 0-1
 // horizontal: 2 right, 3 centre, else left; bits 2-3 vertical: 8 top, else
@@ -187,7 +192,9 @@ int Tavo_WiWin32Surface::SetCurrentFont(unsigned int pixelHeight)
         DeleteObject(m_font);
         m_font = nullptr;
     }
-    if (pixelHeight >= kSmallestFontPixels) {
+    const unsigned int largest =
+        std::max(kLargestFontFloorPixels, 2u * static_cast<unsigned int>(std::max(GetDeviceHeight(), 0)));
+    if (pixelHeight >= kSmallestFontPixels && pixelHeight <= largest) {
         if (pixelHeight < static_cast<unsigned int>(m_minFont)) {
             // The minimum font stands for a larger character height than asked.
             pixelHeight = static_cast<unsigned int>(m_minFont);

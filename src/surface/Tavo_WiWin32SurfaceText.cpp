@@ -1,6 +1,7 @@
 // Tavo_WiWin32Surface: text at a point and text wrapped into a box. Text is
 // drawn at once with TextOut, never batched. Without a font (text under 3
-// pixels high) a thin line of the text's approximate width stands in for it.
+// pixels high, or taller than twice the device window) a thin line of the
+// text's approximate width stands in for it.
 #include "Tavo_WiWin32Surface.h"
 
 #include "Tavo_GrRound.h"

@@ -31,44 +31,57 @@ decltype(&::CreateICA) s_createIC = nullptr;
 decltype(&::CreateCompatibleDC) s_createCompatibleDC = nullptr;
 decltype(&::DeleteDC) s_deleteDC = nullptr;
 
+void NoteTaken(HWND window, HDC dc)
+{
+    if (dc && ResourceLedger::Current())
+        ResourceLedger::Current()->NoteTakenDeviceContext(window, dc);
+}
+
+void NoteGivenBack(HDC dc)
+{
+    if (dc && ResourceLedger::Current())
+        ResourceLedger::Current()->NoteGivenBackDeviceContext(dc);
+}
+
 void NoteDeviceContext(bool happened, int delta)
 {
     if (happened && ResourceLedger::Current())
-        ResourceLedger::Current()->NoteDeviceContext(delta);
+        ResourceLedger::Current()->NoteMadeDeviceContext(delta);
 }
 
 HDC WINAPI NotedGetDC(HWND window)
 {
     const HDC dc = s_getDC(window);
-    NoteDeviceContext(dc != nullptr, +1);
+    NoteTaken(window, dc);
     return dc;
 }
 
 HDC WINAPI NotedGetWindowDC(HWND window)
 {
     const HDC dc = s_getWindowDC(window);
-    NoteDeviceContext(dc != nullptr, +1);
+    NoteTaken(window, dc);
     return dc;
 }
 
 int WINAPI NotedReleaseDC(HWND window, HDC dc)
 {
     const int released = s_releaseDC(window, dc);
-    NoteDeviceContext(released != 0, -1);
+    if (released)
+        NoteGivenBack(dc);
     return released;
 }
 
 HDC WINAPI NotedBeginPaint(HWND window, PAINTSTRUCT* paint)
 {
     const HDC dc = s_beginPaint(window, paint);
-    NoteDeviceContext(dc != nullptr, +1);
+    NoteTaken(window, dc);
     return dc;
 }
 
 BOOL WINAPI NotedEndPaint(HWND window, const PAINTSTRUCT* paint)
 {
-    // EndPaint always succeeds; a paint that began without a device context has none to give back.
-    NoteDeviceContext(paint != nullptr && paint->hdc != nullptr, -1);
+    if (paint)
+        NoteGivenBack(paint->hdc);
     return s_endPaint(window, paint);
 }
 
@@ -222,7 +235,7 @@ void ResourceLedger::NoteTimer(HWND window, UINT_PTR id)
             return;
         }
     }
-    ++m_unnoted;
+    ++m_unnotedTimers;
 }
 
 void ResourceLedger::NoteKilledTimer(HWND window, UINT_PTR id)
@@ -230,6 +243,37 @@ void ResourceLedger::NoteKilledTimer(HWND window, UINT_PTR id)
     for (Timer& timer : m_timers)
         if (timer.id == id && timer.window == window)
             timer = {};
+}
+
+void ResourceLedger::NoteTakenDeviceContext(HWND window, HDC dc)
+{
+    for (TakenDeviceContext& taken : m_takenDeviceContexts) {
+        if (taken.dc == nullptr || (taken.window != nullptr && !::IsWindow(taken.window))) {
+            taken = {window, dc};
+            return;
+        }
+    }
+    ++m_unnotedDeviceContexts;
+}
+
+void ResourceLedger::NoteGivenBackDeviceContext(HDC dc)
+{
+    for (TakenDeviceContext& taken : m_takenDeviceContexts) {
+        if (taken.dc == dc) {
+            taken = {};
+            return;
+        }
+    }
+}
+
+int ResourceLedger::CountDeviceContexts() const
+{
+    // The system gives a window's device contexts back when it ends.
+    int count = m_madeDeviceContexts + m_unnotedDeviceContexts;
+    for (const TakenDeviceContext& taken : m_takenDeviceContexts)
+        if (taken.dc != nullptr && (taken.window == nullptr || ::IsWindow(taken.window)))
+            ++count;
+    return count;
 }
 
 void ResourceLedger::Forget(HWND window, UINT_PTR id)
@@ -253,7 +297,7 @@ int ResourceLedger::CountTimers() const
         if (timer.id != 0 && (timer.window == nullptr || ::IsWindow(timer.window)))
             ++count;
     // A timer the full table could not note counts as running for good.
-    return count + m_unnoted;
+    return count + m_unnotedTimers;
 }
 
 int ResourceLedger::CountThreadTimers() const

@@ -54,7 +54,9 @@ public:
     // already gone makes, and nothing ever kills.
     int CountThreadTimers() const;
     int CountHooks() const { return m_hooks; }
-    int CountDeviceContexts() const { return m_deviceContexts; }
+    // Device contexts taken from windows and not given back (a window's
+    // end gives them back), and those made and not deleted.
+    int CountDeviceContexts() const;
 
     // Kills a noted timer as the modules would (used to deliver a due
     // one-shot tick and to end a thread timer).
@@ -65,13 +67,20 @@ public:
     void NoteTimer(HWND window, UINT_PTR id);
     void NoteKilledTimer(HWND window, UINT_PTR id);
     void NoteHook(int delta) { m_hooks += delta; }
-    void NoteDeviceContext(int delta) { m_deviceContexts += delta; }
+    void NoteTakenDeviceContext(HWND window, HDC dc);
+    void NoteGivenBackDeviceContext(HDC dc);
+    void NoteMadeDeviceContext(int delta) { m_madeDeviceContexts += delta; }
 
 private:
     struct Timer
     {
         HWND window = nullptr;
         UINT_PTR id = 0;
+    };
+    struct TakenDeviceContext
+    {
+        HWND window = nullptr;
+        HDC dc = nullptr;
     };
     // A fixed table, so that the ledger itself allocates nothing while the
     // heap is being counted.
@@ -80,9 +89,12 @@ private:
     static ResourceLedger* s_current;
     std::vector<std::unique_ptr<ImportPatch>> m_patches;
     std::array<Timer, Capacity> m_timers = {};
+    std::array<TakenDeviceContext, Capacity> m_takenDeviceContexts = {};
     int m_hooks = 0;
-    int m_deviceContexts = 0;
-    int m_unnoted = 0;
+    int m_madeDeviceContexts = 0;
+    // Noted nowhere for want of room: counted as held for good.
+    int m_unnotedTimers = 0;
+    int m_unnotedDeviceContexts = 0;
 };
 
 // Counts everything; the timers and hooks come from the ledger (0 without one).

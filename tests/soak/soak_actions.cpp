@@ -191,8 +191,12 @@ Action Engine::Step()
         action = CreateWindow;
     else if (action == CreateWindow && m_hosts.size() >= MaxWindows)
         action = DestroyWindow;
-    SoakHost* host = action == CreateWindow ? nullptr : m_hosts[m_random.Below(static_cast<int>(m_hosts.size()))].get();
+    const int target = action == CreateWindow ? -1 : m_random.Below(static_cast<int>(m_hosts.size()));
+    SoakHost* host = target < 0 ? nullptr : m_hosts[static_cast<size_t>(target)].get();
     Trace("%s", NameOf(action));
+    if (host)
+        Trace(" on window %d (drawing %d, level %g)", target, DrawingIndex(host->Wnd().GetDrawing()),
+              host->Wnd().GetZoomLevel());
     Run(action, host);
     Trace("\n");
     return action;
@@ -279,6 +283,14 @@ void Engine::DestroyAll()
     Pump();
 }
 
+int Engine::DrawingIndex(const Tavo_GrDrawing* drawing) const
+{
+    for (size_t i = 0; i < m_drawings.size(); ++i)
+        if (m_drawings[i].get() == drawing)
+            return static_cast<int>(i);
+    return -1;
+}
+
 Tavo_GrDrawing* Engine::PickDrawing()
 {
     // The sample drawing half of the time, a hostile one otherwise.
@@ -297,9 +309,8 @@ void Engine::DoBind(SoakHost& host)
     const unsigned int clipWidth = m_random.Pick(clipSizes);
     const unsigned int clipHeight = m_random.Pick(clipSizes);
     const int option = m_random.Between(-1, 4);
-    Trace(" drawing %d, max level %d, expansion %d, clip %u x %u", static_cast<int>(std::find_if(
-        m_drawings.begin(), m_drawings.end(), [&](const auto& d) { return d.get() == drawing; }) - m_drawings.begin()),
-        maxLevel, expansion, clipWidth, clipHeight);
+    Trace(" drawing %d, max level %d, expansion %d, clip %u x %u", DrawingIndex(drawing), maxLevel, expansion,
+          clipWidth, clipHeight);
     host.Wnd().SetDrawingInfo(drawing, maxLevel, option, expansion, clipWidth, clipHeight);
 }
 
@@ -540,16 +551,17 @@ void Engine::DoRubberRectangle(SoakHost& host)
     }
     m_time += EventGap;
     ScrollTest::SendMouse(button.up, to, m_time);
-    bool ended = true;
     if (m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId)) {
+        const int reported = wnd.counts.rubberRectangles;
         LoopDeadline deadline;
         ::SendMessageA(host.Scrollee(), WM_TIMER, Tavo_WiScrollee::HoldTimerId, 0);
-        ended = !deadline.Passed();
+        if (deadline.Passed())
+            m_stepFault = "the rubber rectangle's loop had to be ended from outside";
+        else if (wnd.GetDrawing() && wnd.counts.rubberRectangles != reported + 1)
+            m_stepFault = "the rubber rectangle ended by its button was not reported";
     } else {
         ::ReleaseCapture();
     }
-    if (!ended)
-        Trace(" (ended from outside)");
     PumpInput();
     DeliverDueTicks(host);
 }
@@ -769,8 +781,8 @@ void Engine::Trace(const char* format, ...)
     va_start(arguments, format);
     std::vprintf(format, arguments);
     va_end(arguments);
-    if (format[0] == '\n')
-        std::fflush(stdout);
+    // A step that never ends shows how far it came.
+    std::fflush(stdout);
 }
 
 }  // namespace Soak

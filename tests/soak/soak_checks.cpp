@@ -1,5 +1,6 @@
 // Soak::Engine: what a user relies on after every step, and the census of
 // what the process holds whenever no window is left.
+#include "soak_checks.h"
 #include "soak_engine.h"
 
 #include "Tavo_WiDataTip.h"
@@ -44,7 +45,8 @@ bool SpansView(int low, int high, double length)
     return std::fabs(side - length) <= slack;
 }
 
-// What a report needs to know of a window's view.
+}  // namespace
+
 std::string DescribeView(SoakHost& host)
 {
     SoakDrawWnd& wnd = host.Wnd();
@@ -61,10 +63,13 @@ std::string DescribeView(SoakHost& host)
     return text;
 }
 
-}  // namespace
-
 std::string Engine::Check()
 {
+    if (!m_stepFault.empty()) {
+        std::string fault;
+        fault.swap(m_stepFault);
+        return fault;
+    }
     for (size_t i = 0; i < m_hosts.size(); ++i) {
         const std::string fault = CheckWindow(*m_hosts[i]);
         if (!fault.empty())
@@ -77,6 +82,11 @@ std::string Engine::Check()
 }
 
 std::string Engine::CheckWindow(SoakHost& host)
+{
+    return CheckView(host);
+}
+
+std::string CheckView(SoakHost& host)
 {
     if (!host.IsAlive())
         return "the drawing window is gone";

@@ -96,6 +96,9 @@ private:
     CRect HostRect();
     Tavo_GrWRect WorldRect(SoakHost& host);
     Tavo_GrDrawing* PickDrawing();
+    // The drawing's place in m_drawings (0 the sample, then the hostile
+    // kinds in order), -1 for none.
+    int DrawingIndex(const Tavo_GrDrawing* drawing) const;
     void Trace(const char* format, ...);
 
     // ---- checks (soak_checks.cpp) -----------------------------------------------------------
@@ -115,6 +118,7 @@ private:
     std::vector<unsigned char> m_baselineGdiTable;      // what lived in each entry at the baseline
     int m_idleCensuses = 0;
     bool m_warmingUp = false;
+    std::string m_stepFault;                             // what an action saw go wrong, for the step's check
 };
 
 }  // namespace Soak

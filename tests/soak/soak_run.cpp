@@ -28,10 +28,16 @@ Result Run(const Options& options)
         Engine engine(options);
         engine.WarmUp();
         result.before = engine.TakeBaseline();
+        const std::string warmUpFault = engine.Check();
+        if (!warmUpFault.empty()) {
+            result.failedStep = 0;
+            result.failedAction = "warm-up";
+            result.violation = warmUpFault;
+        }
 
         LARGE_INTEGER start;
         ::QueryPerformanceCounter(&start);
-        for (long long step = 1; step <= options.steps; ++step) {
+        for (long long step = 1; step <= options.steps && result.failedStep < 0; ++step) {
             const Action action = engine.Step();
             ++result.actions[action];
             result.stepsRun = step;
