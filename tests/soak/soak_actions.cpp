@@ -270,7 +270,7 @@ void Engine::DoDestroyWindow(SoakHost& host)
 {
     for (auto it = m_hosts.begin(); it != m_hosts.end(); ++it) {
         if (it->get() == &host) {
-            m_hosts.erase(it);
+            Retire(it);
             break;
         }
     }
@@ -279,8 +279,22 @@ void Engine::DoDestroyWindow(SoakHost& host)
 
 void Engine::DestroyAll()
 {
-    m_hosts.clear();
+    while (!m_hosts.empty())
+        Retire(m_hosts.end() - 1);
     Pump();
+}
+
+void Engine::Retire(std::vector<std::unique_ptr<SoakHost>>::iterator host)
+{
+    if (!m_warmingUp) {
+        const SoakDrawWnd::Counts& counts = (*host)->Wnd().counts;
+        m_events.paints += counts.paints;
+        m_events.clicks += counts.clicks;
+        m_events.doubleClicks += counts.doubleClicks;
+        m_events.rubberRectangles += counts.rubberRectangles;
+        m_events.dragAndDrops += counts.dragAndDrops;
+    }
+    m_hosts.erase(host);
 }
 
 int Engine::DrawingIndex(const Tavo_GrDrawing* drawing) const
@@ -584,6 +598,8 @@ void Engine::DoDataTip(SoakHost& host)
     if (m_ledger.HasTimer(monitor, Tavo_WiParkedCursorMonitor::ParkTimerId))
         ::SendMessageA(monitor, WM_TIMER, Tavo_WiParkedCursorMonitor::ParkTimerId, 0);
     Pump();
+    if (scrollee->GetDataTip()->IsVisible() && !m_warmingUp)
+        ++m_events.dataTipsShown;
     const HWND tip = scrollee->GetDataTip()->GetSafeHwnd();
     switch (m_random.Below(3)) {
     case 0:
@@ -700,6 +716,8 @@ void Engine::DoPrint(SoakHost& host)
         printer.StartPage();
         wnd.OnPrint(&printer, &info);
         printer.EndPage();
+        if (info.m_nCurPage >= 1 && info.m_nCurPage <= pages && wnd.GetDrawing() && !m_warmingUp)
+            ++m_events.pagesPrinted;
     }
     printer.EndDoc();
     wnd.OnEndPrinting(&printer, &info);

@@ -47,6 +47,8 @@ public:
     // The GDI objects that live now and did not at the baseline.
     std::string DescribeNewGdiObjects() const { return ::DescribeNewGdiObjects(m_baselineGdiTable); }
     int IdleCensuses() const { return m_idleCensuses; }
+    // What the windows destroyed so far did (the warm-up's left out).
+    const Events& GetEvents() const { return m_events; }
     // Folds the view of every window after a step into a running digest.
     std::uint64_t Digest(std::uint64_t digest, Action action) const;
 
@@ -100,6 +102,8 @@ private:
     // kinds in order), -1 for none.
     int DrawingIndex(const Tavo_GrDrawing* drawing) const;
     void Trace(const char* format, ...);
+    // Adds what a window did to the run's events and destroys it.
+    void Retire(std::vector<std::unique_ptr<SoakHost>>::iterator host);
 
     // ---- checks (soak_checks.cpp) -----------------------------------------------------------
     std::string CheckWindow(SoakHost& host);
@@ -118,6 +122,7 @@ private:
     std::vector<unsigned char> m_baselineGdiTable;      // what lived in each entry at the baseline
     int m_idleCensuses = 0;
     bool m_warmingUp = false;
+    Events m_events;
     std::string m_stepFault;                             // what an action saw go wrong, for the step's check
 };
 

@@ -51,5 +51,10 @@ int main(int argc, char** argv)
         std::printf("%s %s %lld", action ? "," : "", Soak::NameOf(static_cast<Soak::Action>(action)),
                     result.actions[static_cast<size_t>(action)]);
     std::printf("\n");
+    const Soak::Events& e = result.events;
+    std::printf("events: %lld paints, %lld clicks, %lld double clicks, %lld rubber rectangles, %lld drags and "
+                "drops, %lld data tips shown, %lld pages printed\n",
+                e.paints, e.clicks, e.doubleClicks, e.rubberRectangles, e.dragAndDrops, e.dataTipsShown,
+                e.pagesPrinted);
     return result.IsClean() ? 0 : 1;
 }

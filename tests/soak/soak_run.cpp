@@ -58,6 +58,7 @@ Result Run(const Options& options)
         result.idleCensuses = engine.IdleCensuses();
 
         engine.DestroyAll();
+        result.events = engine.GetEvents();
         result.after = TakeCensus(&engine.Ledger());
         if (result.after.gdiObjects != result.before.gdiObjects)
             result.newGdiObjects = engine.DescribeNewGdiObjects();

@@ -70,6 +70,18 @@ struct Options
     std::function<std::string(long long step)> extraCheck;
 };
 
+// What the windows told the application and what they did, over a run.
+struct Events
+{
+    long long paints = 0;
+    long long clicks = 0;
+    long long doubleClicks = 0;
+    long long rubberRectangles = 0;
+    long long dragAndDrops = 0;
+    long long dataTipsShown = 0;
+    long long pagesPrinted = 0;
+};
+
 struct Result
 {
     std::uint64_t seed = 0;
@@ -82,6 +94,7 @@ struct Result
     double seconds = 0.0;               // the steps alone
     std::uint64_t digest = 0;           // of the view after every step
     std::array<long long, ActionCount> actions = {};
+    Events events;
     int idleCensuses = 0;               // times no window was left and the census was compared
     std::string newGdiObjects;          // at the end, when more live than at the start
 
