@@ -1,5 +1,6 @@
-// controls_test.cpp - CScrollBar and CButton on real controls, and the
-// scroll messages a bar sends to its parent's message map.
+// controls_test.cpp - CScrollBar, CButton and CStatusBarCtrl on real
+// controls, and the scroll messages a bar sends to its parent's message map.
+#include <afxcmn.h>
 #include <afxwin.h>
 
 #include <vector>
@@ -12,6 +13,7 @@ namespace {
 
 constexpr UINT kBarId = 1001;
 constexpr UINT kButtonId = 1003;
+constexpr UINT kStatusBarId = 1004;
 
 struct ScrollEvent {
     UINT message;
@@ -104,4 +106,40 @@ TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)
     button.SetCheck(BST_CHECKED);
     EXPECT_EQ(BST_CHECKED, button.GetCheck());
     EXPECT_EQ(&button, m_parent.GetDlgItem(kButtonId));
+}
+
+TEST_F(ControlsTest, StatusBarPlacesItselfAtTheBottomAndKeepsATextPerPart)
+{
+    CStatusBarCtrl bar;
+    ASSERT_TRUE(bar.Create(WS_VISIBLE, CRect(5, 5, 6, 6), &m_parent, kStatusBarId));
+    EXPECT_EQ(&bar, CWnd::FromHandlePermanent(bar.m_hWnd));
+    EXPECT_TRUE(bar.GetStyle() & WS_CHILD);
+    bar.SendMessage(WM_SIZE, 0, 0);
+    CRect client;
+    CRect placed;
+    m_parent.GetClientRect(&client);
+    bar.GetWindowRect(&placed);
+    m_parent.ScreenToClient(&placed);
+    EXPECT_EQ(placed.bottom, client.bottom) << "the rectangle given to Create is ignored";
+    EXPECT_EQ(placed.Width(), client.Width());
+
+    int edges[3] = {60, 120, -1};
+    ASSERT_TRUE(bar.SetParts(3, edges));
+    int read[3] = {};
+    EXPECT_EQ(3, bar.GetParts(3, read));
+    EXPECT_EQ(120, read[1]);
+    EXPECT_EQ(3, bar.GetParts(0, NULL));
+    ASSERT_TRUE(bar.SetText("zoom 2", 1, SBT_POPOUT));
+    ASSERT_TRUE(bar.SetText("", 2, 0));
+    int type = -1;
+    EXPECT_STREQ("zoom 2", static_cast<LPCSTR>(bar.GetText(1, &type)));
+    EXPECT_EQ(SBT_POPOUT, type);
+    EXPECT_EQ(6, bar.GetTextLength(1));
+    EXPECT_STREQ("", static_cast<LPCSTR>(bar.GetText(2)));
+    CRect part;
+    ASSERT_TRUE(bar.GetRect(1, &part));
+    EXPECT_LE(part.right, 120);
+    EXPECT_GE(part.left, 60);
+    bar.SetSimple(TRUE);
+    EXPECT_TRUE(bar.IsSimple());
 }
