@@ -1,0 +1,31 @@
+// StatusText: the texts of the status bar's pointer and zoom parts. Pure
+// functions, tested with plain numbers.
+#pragma once
+
+#include "DrawingUnits.h"
+
+#include <cmath>
+#include <string>
+
+namespace StatusText {
+
+// "x 12.5   y -3.25": a position in drawing units, written to decimals places.
+inline std::string Pointer(double x, double y, int decimals)
+{
+    return "x " + DrawingUnitsText::Fixed(x, decimals) + "   y " + DrawingUnitsText::Fixed(y, decimals);
+}
+
+// "Zoom level 7.5 (2.83x)": the drawing window's zoom level and how much
+// larger than the fitted drawing the view shows it, for levelsPerDoubling
+// levels per doubling of the scale.
+inline std::string Zoom(double level, int levelsPerDoubling)
+{
+    const double magnification = std::pow(2.0, level / (levelsPerDoubling > 0 ? levelsPerDoubling : 1));
+    const bool whole = std::abs(level - std::round(level)) < 0.05;
+    char text[96];
+    std::snprintf(text, sizeof text, whole ? "Zoom level %.0f (%.3gx)" : "Zoom level %.1f (%.3gx)", level,
+                  magnification);
+    return text;
+}
+
+}  // namespace StatusText

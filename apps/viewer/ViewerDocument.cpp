@@ -1,0 +1,57 @@
+#include "ViewerDocument.h"
+
+#include "SampleDrawing.h"
+
+#include <windows.h>
+
+namespace {
+
+std::string FileNameOf(const std::string& path)
+{
+    const size_t slash = path.find_last_of("\\/:");
+    return slash == std::string::npos ? path : path.substr(slash + 1);
+}
+
+// Why the file cannot be opened for reading; empty when it can.
+std::string UnreadableReason(const std::string& path)
+{
+    const HANDLE file = ::CreateFileA(path.c_str(), GENERIC_READ, FILE_SHARE_READ, nullptr, OPEN_EXISTING,
+                                      FILE_ATTRIBUTE_NORMAL, nullptr);
+    if (file != INVALID_HANDLE_VALUE) {
+        ::CloseHandle(file);
+        return std::string();
+    }
+    switch (::GetLastError()) {
+    case ERROR_FILE_NOT_FOUND:
+    case ERROR_PATH_NOT_FOUND: return "there is no such file";
+    case ERROR_ACCESS_DENIED: return "access is denied (a folder, or a file without read permission)";
+    default: return "it cannot be read";
+    }
+}
+
+}  // namespace
+
+std::unique_ptr<ViewerDocument> MakeSampleDocument()
+{
+    auto document = std::make_unique<ViewerDocument>("Sample drawing");
+    BuildSampleDrawing(document->GetDrawing());
+    return document;
+}
+
+OpenDrawingResult OpenDrawing(const std::string& path)
+{
+    OpenDrawingResult result;
+    const std::string name = FileNameOf(path);
+    if (path.empty()) {
+        result.error = "No file name was given.";
+        return result;
+    }
+    const std::string unreadable = UnreadableReason(path);
+    if (!unreadable.empty()) {
+        result.error = "Cannot open " + name + ": " + unreadable + ".";
+        return result;
+    }
+    result.error = "Cannot open " + name + ": this build of the viewer reads no drawing files yet (DXF import "
+                   "is not part of it); it shows the built-in sample drawing.";
+    return result;
+}
