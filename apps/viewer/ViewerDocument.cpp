@@ -2,6 +2,10 @@
 
 #include "SampleDrawing.h"
 
+#include "Tavo_DxfImport.h"
+#include "Tavo_DxfPaletteColours.h"
+#include "Tavo_WiLibrary.h"
+
 #include <windows.h>
 
 namespace {
@@ -51,7 +55,27 @@ OpenDrawingResult OpenDrawing(const std::string& path)
         result.error = "Cannot open " + name + ": " + unreadable + ".";
         return result;
     }
-    result.error = "Cannot open " + name + ": this build of the viewer reads no drawing files yet (DXF import "
-                   "is not part of it); it shows the built-in sample drawing.";
+    auto document = std::make_unique<ViewerDocument>(name);
+    // DXF colours become palette entries of the library's palette.
+    Tavo_DxfPaletteColours colours(*Tavo_WiLibrary::GetPalette());
+    const Tavo_DxfImportResult imported = Tavo_DxfImportFile(path.c_str(), document->GetDrawing(), colours);
+    if (!imported.ok) {
+        result.error = "Cannot open " + name + ": " + imported.error.text +
+                       (imported.error.line > 0 ? " (line " + std::to_string(imported.error.line) + ")." : ".");
+        return result;
+    }
+    if (document->GetDrawing().IsEmpty()) {
+        result.error = "Cannot open " + name + ": it holds nothing the viewer can draw.";
+        return result;
+    }
+    for (const Tavo_DxfMessage& warning : imported.warnings)
+        result.warnings.push_back(warning.line > 0 ? "line " + std::to_string(warning.line) + ": " + warning.text
+                                                   : warning.text);
+    DrawingUnits units;
+    units.scale = imported.scale;
+    units.originX = imported.originX;
+    units.originY = imported.originY;
+    document->SetUnits(units);
+    result.document = std::move(document);
     return result;
 }

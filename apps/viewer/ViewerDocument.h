@@ -38,7 +38,9 @@ struct OpenDrawingResult {
     std::vector<std::string> warnings;          // what was skipped, one line each
 };
 
-// Reads the drawing file at path (a Windows path) into a new document. A file
-// that cannot be read or holds no drawing the viewer can show is refused with
-// a message that names the file and says why.
+// Reads the DXF drawing file at path (a Windows path) into a new document,
+// in the importer's world units (DrawingUnits maps them back to the file's).
+// A file that cannot be read, that the importer refuses or that holds
+// nothing to draw is refused with a message that names the file and says
+// why; entities the importer skipped are listed as warnings.
 OpenDrawingResult OpenDrawing(const std::string& path);

@@ -13,20 +13,13 @@ namespace {
 // The port of printers that write to a file.
 constexpr char FilePort[] = "FILE:";
 
-// Shows the dialog on the application's printer defaults and keeps what the
-// person chose as the new defaults: PrintDlg may reallocate the handles it
-// is given, or hand back those of another printer.
+// Shows the dialog on the application's printer defaults, which then keep
+// the printer and settings the person chose; without an application object,
+// on the system's default printer.
 INT_PTR RunDialog(CPrintDialog& dialog)
 {
     CWinApp* app = AfxGetApp();
-    if (app)
-        app->GetPrinterDeviceDefaults(&dialog.m_pd);
-    const INT_PTR answer = dialog.DoModal();
-    if (app) {
-        app->m_hDevMode = dialog.m_pd.hDevMode;
-        app->m_hDevNames = dialog.m_pd.hDevNames;
-    }
-    return answer;
+    return app ? app->DoPrintDialog(&dialog) : dialog.DoModal();
 }
 
 // The pages the dialog chose: a range as given (within the grid), the

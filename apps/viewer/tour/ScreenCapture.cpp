@@ -20,11 +20,36 @@ std::unique_ptr<DibCanvas> Grab(const RECT& area)
     return copied ? std::move(canvas) : nullptr;
 }
 
+namespace {
+
+// Draws the pointer's current shape at its place into a canvas showing area.
+void DrawPointer(DibCanvas& canvas, const RECT& area)
+{
+    CURSORINFO pointer = {};
+    pointer.cbSize = sizeof(pointer);
+    if (!::GetCursorInfo(&pointer) || !(pointer.flags & CURSOR_SHOWING) || !pointer.hCursor)
+        return;
+    ICONINFO shape = {};
+    if (!::GetIconInfo(pointer.hCursor, &shape))
+        return;
+    // GetIconInfo hands out copies of the shape's bitmaps.
+    if (shape.hbmMask)
+        ::DeleteObject(shape.hbmMask);
+    if (shape.hbmColor)
+        ::DeleteObject(shape.hbmColor);
+    ::DrawIconEx(canvas.GetDC(), pointer.ptScreenPos.x - area.left - static_cast<int>(shape.xHotspot),
+                 pointer.ptScreenPos.y - area.top - static_cast<int>(shape.yHotspot), pointer.hCursor, 0, 0, 0,
+                 nullptr, DI_NORMAL);
+}
+
+}  // namespace
+
 std::string SavePng(const RECT& area, const std::string& path)
 {
     const std::unique_ptr<DibCanvas> canvas = Grab(area);
     if (!canvas)
         return "could not copy the screen";
+    DrawPointer(*canvas, area);
     return WritePng(*canvas, path);
 }
 

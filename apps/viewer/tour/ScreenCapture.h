@@ -15,8 +15,9 @@ namespace ScreenCapture {
 // The screen's pixels inside area (screen coordinates), or null when GDI
 // refused.
 std::unique_ptr<DibCanvas> Grab(const RECT& area);
-// Writes the screen's pixels inside area to a PNG file; empty on success,
-// else why not.
+// Writes the screen's pixels inside area to a PNG file, with the mouse
+// pointer drawn where it is (the screen's pixels never hold it); empty on
+// success, else why not.
 std::string SavePng(const RECT& area, const std::string& path);
 // The screen rectangle that holds both windows (second may be null).
 RECT Around(HWND first, HWND second);

@@ -86,11 +86,14 @@ POINT CentreOf(HWND window)
     return {(rect.left + rect.right) / 2, (rect.top + rect.bottom) / 2};
 }
 
-void Settle(HWND frame, bool repaint)
+void Settle(HWND frame, HWND extra, bool repaint)
 {
     SendWithin(frame, WM_NULL, 0, 0);
-    if (repaint)
+    if (repaint) {
         ::RedrawWindow(frame, nullptr, nullptr, RDW_UPDATENOW | RDW_ALLCHILDREN);
+        if (extra)
+            ::RedrawWindow(extra, nullptr, nullptr, RDW_UPDATENOW | RDW_ALLCHILDREN);
+    }
     SendWithin(frame, WM_NULL, 0, 0);
     ::Sleep(ScreenFlushMs);
 }

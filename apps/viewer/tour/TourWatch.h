@@ -29,8 +29,9 @@ HWND VisibleDialogOf(DWORD thread);
 // The centre of a window on the screen.
 POINT CentreOf(HWND window);
 
-// Returns once thread has handled every message sent before, and, with
-// repaint, has painted every window of frame that waited for a paint.
-void Settle(HWND frame, bool repaint);
+// Returns once the thread of frame has handled every message sent before,
+// and, with repaint, has painted every window of frame and of extra (a
+// pop-up; may be null) that waited for a paint.
+void Settle(HWND frame, HWND extra, bool repaint);
 
 }  // namespace TourWatch

@@ -272,7 +272,7 @@ bool ViewerTour::PrintPageGrid()
 
 bool ViewerTour::TakePicture(const std::string& file, const std::string& caption, HWND extra, bool repaint)
 {
-    Settle(m_frameWindow, repaint);
+    Settle(m_frameWindow, extra, repaint);
     const std::string failure = ScreenCapture::SavePng(ScreenCapture::Around(m_frameWindow, extra), PathOf(file));
     if (!failure.empty())
         return Fail(file + ": " + failure);
