@@ -22,6 +22,11 @@ BOOL DrawingView::CreateView(CWnd* parent, const CRect& rect, UINT id)
     if (!Create(WS_CHILD | WS_VISIBLE, rect, parent, id))
         return FALSE;
     GetScrollee()->SetBackgroundColor(ViewerSettings::Background);
+    // Both bars always show, so the view keeps its size at every zoom: bars
+    // that came and went would change the fitted scale under the view, and
+    // zooming out as far as in would not lead back to the fitted drawing.
+    SetScrollBarAutoVisibilityFlag(0);
+    SetScrollBarVisibilityFlags(1, 1);
     return TRUE;
 }
 

@@ -65,11 +65,13 @@ protected:
     void DoRubberRectangle(UINT button, UINT flags, const CPoint& start) override;
     void OnRubberRectangle(UINT button, UINT flags, const Tavo_GrWRect& rect) override;
     CString GetDataTipText(const Tavo_GrWRect& aperture) override;
+
+public:
+    // The scrollee's point forms, as public as the drawing window has them.
     using Tavo_WiDrawWnd::OnClick;
     using Tavo_WiDrawWnd::OnDoubleClick;
     using Tavo_WiDrawWnd::GetDataTipText;
 
-public:
     afx_msg BOOL OnMouseWheel(UINT flags, short delta, CPoint point);
     afx_msg void OnWindowPosChanged(WINDOWPOS* windowPos);
 

@@ -5,6 +5,7 @@
 #include "DrawingUnits.h"
 
 #include <cmath>
+#include <cstdio>
 #include <string>
 
 namespace StatusText {
@@ -22,10 +23,12 @@ inline std::string Zoom(double level, int levelsPerDoubling)
 {
     const double magnification = std::pow(2.0, level / (levelsPerDoubling > 0 ? levelsPerDoubling : 1));
     const bool whole = std::abs(level - std::round(level)) < 0.05;
-    char text[96];
-    std::snprintf(text, sizeof text, whole ? "Zoom level %.0f (%.3gx)" : "Zoom level %.1f (%.3gx)", level,
-                  magnification);
-    return text;
+    char levelText[32];
+    std::snprintf(levelText, sizeof levelText, whole ? "%.0f" : "%.1f", level);
+    // Three digits, and whole numbers once those need more.
+    char times[32];
+    std::snprintf(times, sizeof times, magnification < 100.0 ? "%.3g" : "%.0f", magnification);
+    return std::string("Zoom level ") + levelText + " (" + times + "x)";
 }
 
 }  // namespace StatusText

@@ -10,10 +10,14 @@
 
 namespace {
 
+// The name of the file without its folder; a path that names a folder is
+// named whole.
 std::string FileNameOf(const std::string& path)
 {
     const size_t slash = path.find_last_of("\\/:");
-    return slash == std::string::npos ? path : path.substr(slash + 1);
+    if (slash == std::string::npos || slash + 1 == path.size())
+        return path;
+    return path.substr(slash + 1);
 }
 
 // Why the file cannot be opened for reading; empty when it can.

@@ -13,15 +13,6 @@ namespace {
 // The port of printers that write to a file.
 constexpr char FilePort[] = "FILE:";
 
-// Shows the dialog on the application's printer defaults, which then keep
-// the printer and settings the person chose; without an application object,
-// on the system's default printer.
-INT_PTR RunDialog(CPrintDialog& dialog)
-{
-    CWinApp* app = AfxGetApp();
-    return app ? app->DoPrintDialog(&dialog) : dialog.DoModal();
-}
-
 // The pages the dialog chose: a range as given (within the grid), the
 // current page as OnBeginPrinting turned it into a range, or all of them.
 void ChosenPages(const CPrintInfo& info, UINT& first, UINT& last)
@@ -52,11 +43,17 @@ Result PrintView(DrawingView& view, CWnd* owner, const std::string& title, const
 {
     if (!view.GetDrawing())
         return Failure("There is no drawing to print.");
+    // The application object holds the printer settings between jobs.
+    CWinApp* app = AfxGetApp();
+    if (!app)
+        return Failure("There is no application object to keep the printer settings.");
     CPrintInfo info;
     view.OnPreparePrinting(&info);
     CPrintDialog& dialog = *info.m_pPD;
     dialog.m_pd.hwndOwner = owner ? owner->GetSafeHwnd() : nullptr;
-    if (RunDialog(dialog) != IDOK) {
+    // The dialog runs on the application's printer defaults, which then keep
+    // the printer and settings the person chose.
+    if (app->DoPrintDialog(&dialog) != IDOK) {
         Result cancelled;
         cancelled.outcome = Outcome::Cancelled;
         cancelled.message = "Printing cancelled.";

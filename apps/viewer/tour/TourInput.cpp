@@ -15,7 +15,7 @@ DWORD TourInput::Stamp(DWORD later)
     return m_last;
 }
 
-void TourInput::SendMouse(DWORD flags, POINT screen, DWORD data, DWORD time)
+INPUT TourInput::MouseInput(DWORD flags, POINT screen, DWORD data, DWORD time)
 {
     const long long width = ::GetSystemMetrics(SM_CXSCREEN);
     const long long height = ::GetSystemMetrics(SM_CYSCREEN);
@@ -27,10 +27,10 @@ void TourInput::SendMouse(DWORD flags, POINT screen, DWORD data, DWORD time)
     input.mi.mouseData = data;
     input.mi.dwFlags = flags | MOUSEEVENTF_MOVE | MOUSEEVENTF_ABSOLUTE;
     input.mi.time = time;
-    ::SendInput(1, &input, sizeof input);
+    return input;
 }
 
-void TourInput::SendKey(WORD virtualKey, WORD scan, DWORD flags)
+INPUT TourInput::KeyInput(WORD virtualKey, WORD scan, DWORD flags)
 {
     INPUT input = {};
     input.type = INPUT_KEYBOARD;
@@ -38,6 +38,18 @@ void TourInput::SendKey(WORD virtualKey, WORD scan, DWORD flags)
     input.ki.wScan = scan;
     input.ki.dwFlags = flags;
     input.ki.time = Stamp();
+    return input;
+}
+
+void TourInput::SendMouse(DWORD flags, POINT screen, DWORD data, DWORD time)
+{
+    INPUT input = MouseInput(flags, screen, data, time);
+    ::SendInput(1, &input, sizeof input);
+}
+
+void TourInput::SendKey(WORD virtualKey, WORD scan, DWORD flags)
+{
+    INPUT input = KeyInput(virtualKey, scan, flags);
     ::SendInput(1, &input, sizeof input);
 }
 
@@ -59,14 +71,22 @@ void TourInput::Wheel(POINT screen, int notches)
 void TourInput::KeyDown(WORD virtualKey) { SendKey(virtualKey, 0, 0); }
 void TourInput::KeyUp(WORD virtualKey) { SendKey(virtualKey, 0, KEYEVENTF_KEYUP); }
 
+void TourInput::PressWithShift(POINT screen)
+{
+    INPUT inputs[2] = {KeyInput(VK_SHIFT, 0, 0), MouseInput(MOUSEEVENTF_LEFTDOWN, screen, 0, Stamp())};
+    ::SendInput(2, inputs, sizeof(INPUT));
+}
+
 void TourInput::Key(WORD virtualKey, WORD modifier)
 {
-    if (modifier)
-        KeyDown(modifier);
-    KeyDown(virtualKey);
-    KeyUp(virtualKey);
-    if (modifier)
-        KeyUp(modifier);
+    if (!modifier) {
+        INPUT inputs[2] = {KeyInput(virtualKey, 0, 0), KeyInput(virtualKey, 0, KEYEVENTF_KEYUP)};
+        ::SendInput(2, inputs, sizeof(INPUT));
+        return;
+    }
+    INPUT inputs[4] = {KeyInput(modifier, 0, 0), KeyInput(virtualKey, 0, 0), KeyInput(virtualKey, 0, KEYEVENTF_KEYUP),
+                       KeyInput(modifier, 0, KEYEVENTF_KEYUP)};
+    ::SendInput(4, inputs, sizeof(INPUT));
 }
 
 void TourInput::Type(const std::string& text)

@@ -202,8 +202,7 @@ bool ViewerTour::ZoomToRubberRectangle()
     const POINT to = ViewPoint(0.62, 0.62);
     m_zoomBeforeRectangle = Status(ViewerStatusBar::Zoom);
     m_input.MoveTo(from);
-    m_input.KeyDown(VK_SHIFT);
-    m_input.Press(from);
+    m_input.PressWithShift(from);
     // With Shift held the drag is a rubber rectangle, whose loop captures
     // the pointer for the drawing window itself.
     if (!WaitFor([this] { return CaptureOf(m_viewerThread) == m_view; })) {
