@@ -19,10 +19,17 @@ int ViewerStatusBar::Layout(int width)
     return bar.Height();
 }
 
+std::string ViewerStatusBar::PartText(const std::string& text)
+{
+    if (text.size() <= MaxPartLength)
+        return text;
+    return text.substr(0, MaxPartLength - 3) + "...";
+}
+
 void ViewerStatusBar::SetPartText(Part part, const std::string& text)
 {
     // The control keeps its own copy of the text.
-    SetText(text.c_str(), part, 0);
+    SetText(PartText(text).c_str(), part, 0);
 }
 
 std::string ViewerStatusBar::GetPartText(Part part) const

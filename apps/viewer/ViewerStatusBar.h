@@ -20,11 +20,17 @@ public:
     // Widths of the fixed parts, in pixels; the message takes the rest.
     static constexpr int PointerWidth = 280;
     static constexpr int ZoomWidth = 190;
+    // The most characters a part holds; longer texts are cut and end in
+    // "...". Far more than a part shows, and a bound on what a reader of
+    // the bar (SB_GETTEXT has no buffer size) must make room for.
+    static constexpr size_t MaxPartLength = 255;
 
     BOOL Create(CWnd* parent, UINT id);
     // Places the bar along the parent's bottom edge and divides it for a
     // parent client area width pixels wide; returns the bar's height.
     int Layout(int width);
     void SetPartText(Part part, const std::string& text);
+    // text as a part holds it: cut to MaxPartLength characters.
+    static std::string PartText(const std::string& text);
     std::string GetPartText(Part part) const;
 };

@@ -4,6 +4,7 @@
 #include "ItemDescription.h"
 #include "StatusText.h"
 #include "ViewerOptions.h"
+#include "ViewerStatusBar.h"
 
 #include "Tavo_GrDrawingBuilder.h"
 
@@ -68,6 +69,15 @@ TEST(ItemDescription, NamesLayerKindSizeTextAndHowManyMoreLieThere)
     EXPECT_EQ(ItemDescription::DescribeAperture(drawing, {2900, 1400, 2950, 1450}, metres), "Nothing here");
     EXPECT_EQ(ItemDescription::KindName(Tavo_GrItemKind::Line, true), "line") << "only closed shapes are filled";
     EXPECT_EQ(ItemDescription::KindName(Tavo_GrItemKind::Call, false), "symbol");
+}
+
+TEST(ViewerStatusBar, APartHoldsAtMostItsLongestTextAndSaysWhereItWasCut)
+{
+    const std::string longest(ViewerStatusBar::MaxPartLength, 'x');
+    EXPECT_EQ(ViewerStatusBar::PartText(longest), longest);
+    const std::string cut = ViewerStatusBar::PartText(longest + "y");
+    EXPECT_EQ(cut.size(), ViewerStatusBar::MaxPartLength);
+    EXPECT_EQ(cut.substr(cut.size() - 4), "x...");
 }
 
 TEST(ViewerOptions, TheCommandLineNamesAFileOrATourAndRefusesTheRest)

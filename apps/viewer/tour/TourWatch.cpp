@@ -1,8 +1,9 @@
 #include "TourWatch.h"
 
+#include "ViewerStatusBar.h"
+
 #include <commctrl.h>
 
-#include <vector>
 
 namespace TourWatch {
 
@@ -49,10 +50,12 @@ std::string WindowText(HWND window)
 
 std::string StatusPart(HWND statusBar, int part)
 {
-    const int length = LOWORD(SendWithin(statusBar, SB_GETTEXTLENGTHA, part, 0));
-    std::vector<char> text(static_cast<size_t>(length) + 1, '\0');
-    SendWithin(statusBar, SB_GETTEXTA, part, reinterpret_cast<LPARAM>(text.data()));
-    return text.data();
+    // The text may change between two messages to the viewer's thread, so
+    // its length is not asked first: the buffer holds the longest text the
+    // viewer ever gives a part.
+    char text[ViewerStatusBar::MaxPartLength + 1] = {};
+    SendWithin(statusBar, SB_GETTEXTA, part, reinterpret_cast<LPARAM>(text));
+    return text;
 }
 
 HWND CaptureOf(DWORD thread)
