@@ -205,14 +205,18 @@ bool ViewerTour::PanWithAutoscroll()
     }
     if (!TakePicture("06-pan-drag.png", "a drag pans the zoomed-in drawing with the pointer"))
         return false;
-    // Past the view's left edge: the view keeps scrolling while the pointer
-    // stays out there.
+    // Past the view's bottom edge, onto the status bar: the view keeps
+    // scrolling while the pointer stays out there. The pointer stays inside
+    // the frame: entering a window again would make Wine bring its modifier
+    // keys in line with the X server's, which the Shift of the next step
+    // must not meet.
     RECT view = {};
     ::GetWindowRect(m_scrollee, &view);
-    const POINT outside = {view.left - 25, inside.y};
+    const POINT outside = {inside.x, view.bottom + 25};
     m_input.MoveTo(outside);
     Pause(AutoscrollMs);
-    const bool taken = TakePicture("07-autoscroll.png", "the pointer left the view: the view scrolls on by itself");
+    const bool taken =
+        TakePicture("07-autoscroll.png", "the pointer went past the view's edge: the view scrolls on by itself");
     m_input.Release(outside);
     if (!WaitFor([this] { return CaptureOf(m_viewerThread) == nullptr; }))
         return Fail("releasing the button did not end the drag");
