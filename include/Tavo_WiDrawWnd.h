@@ -205,9 +205,13 @@ protected:
 private:
     // Re-derives the scroll model (range, deltas, extent, position) from the
     // mapping after zooming it by type and amount about a device point (null:
-    // the view's centre, or the drawing's at the zero level). Invalidates the
+    // the view's centre, or the drawing's at the zero level), once more when
+    // laying out the scroll bars changed the scrollee's size. Invalidates the
     // scrollee when the view changed or force is set.
     void InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force);
+    // Sets the scroll range, deltas, extent and position from the mapping's
+    // view of a scrollee of the given size, and lays out.
+    void DeriveScrollModel(const Tavo_GrWRect& bounds, const CSize& size);
     // The pointer as a device point of the scrollee, unclipped; (0, 0) unbound.
     Tavo_GrDPoint GetCursorPositionInScrollee();
     // The scrollee's client size.
