@@ -11,6 +11,7 @@
 #include <climits>
 #include <cmath>
 #include <limits>
+#include <memory>
 
 using namespace DrawWndTest;
 using ScrollTest::PixelAt;
@@ -205,6 +206,8 @@ TEST_F(DrawWndViewTest, BoundWithoutSurfacePaintsNothingWhileTheScrolleeStillEra
 TEST_F(DrawWndViewTest, DrawingBoundRightAfterCreateIsFittedToTheRealClientArea)
 {
     Bind();
+    EXPECT_EQ(Wnd().surface.GetSurfaceOption(), 3);
+    EXPECT_TRUE(Wnd().surface.IsScreenPaint());
     EXPECT_EQ(hosted.ScrolleeSize(), CSize(500, 400));
     EXPECT_DOUBLE_EQ(Scale(), 0.5);
     EXPECT_EQ(Wnd().GetWorldClipBox(), HalvesDrawing::Bounds);
@@ -223,8 +226,9 @@ TEST_F(DrawWndViewTest, RebindingStartsAgainAtTheZeroLevelAndUnbindingStopsPaint
     Bind();
     Zoom(Tavo_GrZoom::In, 5);
     HalvesDrawing other;
-    Wnd().SetDrawingInfo(&other.drawing, 50, 3, 0, 0, 0);
+    Wnd().SetDrawingInfo(&other.drawing, 50, 7, 0, 0, 0);
     PaintNow(Scrollee());
+    EXPECT_EQ(Wnd().surface.GetSurfaceOption(), 7);
     EXPECT_EQ(Wnd().GetZoomLevel(), 0.0);
     EXPECT_EQ(Wnd().GetWorldClipBox(), HalvesDrawing::Bounds);
     EXPECT_EQ(PixelAt(Scrollee(), 100, 200), RedPixel);
@@ -530,6 +534,51 @@ TEST_F(DrawWndViewTest, ScrollByTheBarRepaintsOnlyTheUncoveredStripAsAFullRepain
         PaintNow(Scrollee());
         EXPECT_EQ(DifferingPixels(scrolled, Snapshot(Scrollee())), 0) << step.code;
     }
+}
+
+TEST_F(DrawWndViewTest, CentringAtThePointerBringsItsWorldPointToTheMiddle)
+{
+    Bind();
+    Zoom(Tavo_GrZoom::In, 5);
+    const CPoint pixel(100, 120);
+    const Tavo_GrWPoint pointed = WorldAt(pixel);
+    const CPoint screen = ToScreen(pixel);
+    ::SetCursorPos(screen.x, screen.y);
+    Wnd().CenterWindowAtCursor();
+    PaintNow(Scrollee());
+    const CSize size = hosted.ScrolleeSize();
+    EXPECT_NEAR(WorldAt(CPoint(size.cx / 2, size.cy / 2)).x, pointed.x, 1);
+    EXPECT_NEAR(WorldAt(CPoint(size.cx / 2, size.cy / 2)).y, pointed.y, 1);
+}
+
+TEST_F(DrawWndViewTest, PaintPumpDispatchesAtMostTenPaintsAndLeavesAQuitForTheApplication)
+{
+    Bind();
+    Zoom(Tavo_GrZoom::In, 5);
+    std::vector<std::unique_ptr<ScrollTest::TestWindow>> others;
+    for (int i = 0; i < 12; ++i)
+        others.push_back(std::make_unique<ScrollTest::TestWindow>(CRect(510, 10 * i, 520, 10 * i + 8), hosted.host.Handle()));
+    ::RedrawWindow(hosted.host.Handle(), nullptr, nullptr, RDW_UPDATENOW | RDW_ALLCHILDREN);
+
+    // The scrolled strip and twelve other windows wait; ten are painted.
+    Wnd().ScrollWindowByDeviceDeltas(30, 0);
+    for (const auto& other : others)
+        ::InvalidateRect(other->Handle(), nullptr, TRUE);
+    Wnd().PumpPaintMessages();
+    int waiting = PendingUpdate(Scrollee()).IsRectEmpty() ? 0 : 1;
+    for (const auto& other : others)
+        waiting += PendingUpdate(other->Handle()).IsRectEmpty() ? 0 : 1;
+    EXPECT_EQ(waiting, 13 - Tavo_WiDrawWnd::MaxPumpedPaintMessages);
+
+    ::PostQuitMessage(3);
+    Wnd().PumpPaintMessages();
+    MSG msg;
+    ASSERT_TRUE(::PeekMessageA(&msg, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE));
+    EXPECT_EQ(msg.wParam, 3u);
+    Wnd().PumpPaintMessages();
+    EXPECT_TRUE(PendingUpdate(Scrollee()).IsRectEmpty());
+    for (const auto& other : others)
+        EXPECT_TRUE(PendingUpdate(other->Handle()).IsRectEmpty());
 }
 
 // ---- window size ---------------------------------------------------------------------------
