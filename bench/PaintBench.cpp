@@ -1,0 +1,371 @@
+// paint_bench: what the drawing window's own paint path costs on a large
+// drawing, on a real window of the virtual display.
+//
+// A generated drawing of a million primitives (BenchDrawing) is bound to a
+// Tavo_WiDrawWnd of 1280 x 1024 pixels, in a borderless popup that covers the
+// display. Every figure goes through the window as an application's user
+// drives it: invalidation and WM_PAINT through the scrollee, the scroll
+// window's ScrollWindowEx with its strip repaint, a pan drag's step through
+// the pointer code and PumpPaintMessages. Each run measures, in turn:
+//   full     a full paint at the zero level (the reference);
+//   deep     a full paint at the zoom level where about 1 % of the drawing
+//            is in view;
+//   scroll   a scroll by 10 % of the view (alternately right and left) and
+//            the repaint of its strip, one level in (the densest zoomed view);
+//   pan      one pan-drag step of 5 % of the view on both axes, one level in;
+// and the heap allocations of each of them. It prints the medians of the
+// times and of their ratios to the full paint of the same run.
+#include "BenchDrawing.h"
+#include "HeapCounter.h"
+
+#include "Tavo_GrDrawing.h"
+#include "Tavo_WiDrawWnd.h"
+#include "Tavo_WiLibrary.h"
+#include "Tavo_WiNativeWindowSurface.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cmath>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <vector>
+
+namespace {
+
+const int kDefaultPrimitives = 1000000;
+const int kDefaultRuns = 7;
+const int kViewWidth = 1280;
+const int kViewHeight = 1024;
+const UINT kDrawWndId = 1;
+const int kMaxZoomLevel = 50;
+const int kSurfaceOption = 3;
+// The part of the drawing's area in view at the deep level.
+const double kDeepVisibleFraction = 0.01;
+const int kScrollPercent = 10;
+// A pan step: the pointer moves this percentage of the view on each axis.
+const int kPanPercent = 5;
+
+struct Options {
+    int primitives = kDefaultPrimitives;
+    int runs = kDefaultRuns;
+};
+
+bool ParseOptions(int argc, char** argv, Options& options)
+{
+    for (int i = 1; i < argc; ++i) {
+        const bool isPrimitives = std::strcmp(argv[i], "--primitives") == 0;
+        const bool isRuns = std::strcmp(argv[i], "--runs") == 0;
+        if ((!isPrimitives && !isRuns) || i + 1 >= argc)
+            return false;
+        char* end = nullptr;
+        errno = 0;
+        const long value = std::strtol(argv[++i], &end, 10);
+        if (errno != 0 || *end != '\0' || value < 1 || value > 50000000)
+            return false;
+        (isPrimitives ? options.primitives : options.runs) = static_cast<int>(value);
+    }
+    return options.runs >= 1;
+}
+
+class Stopwatch {
+public:
+    Stopwatch() { QueryPerformanceCounter(&m_start); }
+    double Seconds() const
+    {
+        LARGE_INTEGER now, frequency;
+        QueryPerformanceCounter(&now);
+        QueryPerformanceFrequency(&frequency);
+        return static_cast<double>(now.QuadPart - m_start.QuadPart) / static_cast<double>(frequency.QuadPart);
+    }
+
+private:
+    LARGE_INTEGER m_start;
+};
+
+double Median(std::vector<double> values)
+{
+    std::sort(values.begin(), values.end());
+    const size_t n = values.size();
+    return n % 2 ? values[n / 2] : (values[n / 2 - 1] + values[n / 2]) / 2.0;
+}
+
+// Dispatches what is pending, as an application's message loop would
+// between two user actions.
+void PumpPending()
+{
+    MSG msg;
+    while (PeekMessageA(&msg, nullptr, 0, 0, PM_REMOVE)) {
+        TranslateMessage(&msg);
+        DispatchMessageA(&msg);
+    }
+}
+
+// The drawing window with its own on-screen surface.
+class BenchDrawWnd : public Tavo_WiDrawWnd {
+public:
+    unsigned long long TakePrimitiveCount()
+    {
+        Tavo_GrSurfaceStats stats;
+        m_surface.FetchStats(stats);
+        m_surface.ResetStats();
+        unsigned long long count = 0;
+        for (int c = Tavo_GrSurfaceStats::Dots; c <= Tavo_GrSurfaceStats::Calls; ++c)
+            count += stats.Get(static_cast<Tavo_GrSurfaceStats::Counter>(c));
+        return count;
+    }
+
+protected:
+    Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return &m_surface; }
+
+private:
+    Tavo_WiNativeWindowSurface m_surface;
+};
+
+// A borderless popup at the display's origin, the drawing window's parent.
+class HostWindow {
+public:
+    HostWindow()
+    {
+        WNDCLASSA wc = {};
+        wc.lpfnWndProc = DefWindowProcA;
+        wc.hInstance = GetModuleHandleA(nullptr);
+        wc.hbrBackground = static_cast<HBRUSH>(GetStockObject(WHITE_BRUSH));
+        wc.lpszClassName = "PaintBenchHost";
+        RegisterClassA(&wc);
+        m_hwnd = CreateWindowExA(0, wc.lpszClassName, "paint_bench", WS_POPUP | WS_VISIBLE | WS_CLIPCHILDREN, 0, 0,
+                                 kViewWidth, kViewHeight, nullptr, nullptr, wc.hInstance, nullptr);
+        m_wnd.Attach(m_hwnd);
+        SetForegroundWindow(m_hwnd);
+        PumpPending();
+    }
+    ~HostWindow()
+    {
+        m_wnd.Detach();
+        DestroyWindow(m_hwnd);
+    }
+    HostWindow(const HostWindow&) = delete;
+    HostWindow& operator=(const HostWindow&) = delete;
+
+    CWnd* Wnd() { return &m_wnd; }
+    bool IsValid() const { return m_hwnd != nullptr; }
+
+private:
+    HWND m_hwnd = nullptr;
+    CWnd m_wnd;
+};
+
+// One measured action: its times and heap allocations over the runs.
+struct Measure {
+    explicit Measure(const char* n) : name(n) {}
+    const char* name;
+    std::vector<double> seconds;
+    std::vector<double> ratios;       // to the full paint of the same run
+    long long mostAllocations = 0;
+    unsigned long long primitives = 0;  // drawn by the last of them
+};
+
+// The area of the part of a rectangle that lies inside bounds.
+double OverlapArea(const Tavo_GrWRect& r, const Tavo_GrWRect& bounds)
+{
+    const double w = std::min(r.x2, bounds.x2) - static_cast<double>(std::max(r.x1, bounds.x1));
+    const double h = std::min(r.y2, bounds.y2) - static_cast<double>(std::max(r.y1, bounds.y1));
+    return w > 0 && h > 0 ? w * h : 0.0;
+}
+
+double Area(const Tavo_GrWRect& r)
+{
+    return (static_cast<double>(r.x2) - r.x1) * (static_cast<double>(r.y2) - r.y1);
+}
+
+class PaintBench {
+public:
+    PaintBench(BenchDrawWnd& wnd, const Tavo_GrDrawing& drawing, HeapCounter& heap)
+        : m_wnd(wnd), m_scrollee(wnd.GetScrollee()->GetSafeHwnd()), m_heap(heap)
+    {
+        drawing.FetchBounds(m_bounds);
+    }
+
+    // Binds the drawing and paints it once at the zero level: that first
+    // pass builds the drawing's index. Chooses the deep level: the one at
+    // which kDeepVisibleFraction of the drawing's area is in view.
+    void Bind(Tavo_GrDrawing& drawing)
+    {
+        m_wnd.SetDrawingInfo(&drawing, kMaxZoomLevel, kSurfaceOption, 0, 0, 0);
+        UpdateWindow(m_scrollee);
+        PumpPending();
+        const double linear = std::sqrt(Area(m_wnd.GetWorldClipBox()) / (kDeepVisibleFraction * Area(m_bounds)));
+        m_deepLevel = m_wnd.GetMapping()->GetLevelsPerDoubling() * std::log2(linear);
+    }
+
+    // The views to measure in. The zoom's own repaint is dropped where the
+    // measured action repaints the whole view anyway.
+    void ShowZeroLevel()
+    {
+        m_wnd.ZoomWindow(Tavo_GrZoom::ZeroLevel, 1, Tavo_WiZoomCenter::AtViewCentre, 0, 0, true);
+        DropPendingPaint();
+    }
+    // Returns the part of the drawing's area in view.
+    double ShowDeepLevel()
+    {
+        m_wnd.ZoomWindow(m_deepLevel, (m_bounds.x1 + m_bounds.x2) / 2, (m_bounds.y1 + m_bounds.y2) / 2);
+        DropPendingPaint();
+        return OverlapArea(m_wnd.GetWorldClipBox(), m_bounds) / Area(m_bounds);
+    }
+    void ShowFirstLevelIn()
+    {
+        m_wnd.ZoomWindow(Tavo_GrZoom::ZeroLevel, 1, Tavo_WiZoomCenter::AtViewCentre, 0, 0, true);
+        m_wnd.ZoomWindow(Tavo_GrZoom::In, 1, Tavo_WiZoomCenter::AtViewCentre, 0, 0, false);
+        UpdateWindow(m_scrollee);
+        PumpPending();
+    }
+
+    double FullPaint(Measure& measure)
+    {
+        return Timed(measure, [&] {
+            InvalidateRect(m_scrollee, nullptr, TRUE);
+            UpdateWindow(m_scrollee);
+        });
+    }
+
+    double Scroll(Measure& measure, bool forward)
+    {
+        return Timed(measure, [&] {
+            m_wnd.ScrollWindow(forward ? Tavo_WiScroll::Right : Tavo_WiScroll::Left, Tavo_WiScroll::Percent,
+                               kScrollPercent);
+            UpdateWindow(m_scrollee);
+        });
+    }
+
+    // A pan drag from the view's middle by kPanPercent on both axes; only
+    // the step itself (two scrolls, each with PumpPaintMessages) is timed.
+    double PanStep(Measure& measure, bool forward)
+    {
+        CRect client;
+        GetClientRect(m_scrollee, &client);
+        const CPoint start(client.Width() / 2, client.Height() / 2);
+        const int sign = forward ? 1 : -1;
+        const CPoint step(start.x + sign * client.Width() * kPanPercent / 100,
+                          start.y + sign * client.Height() * kPanPercent / 100);
+        m_wnd.OnDragStart(MK_LBUTTON, MK_LBUTTON, start);
+        const double seconds = Timed(measure, [&] { m_wnd.OnDragMove(MK_LBUTTON, MK_LBUTTON, step); });
+        m_wnd.OnDragEnd(MK_LBUTTON, 0, step, 1);
+        PumpPending();
+        return seconds;
+    }
+
+private:
+    void DropPendingPaint()
+    {
+        ValidateRect(m_scrollee, nullptr);
+        PumpPending();
+    }
+
+    template <class Action>
+    double Timed(Measure& measure, Action action)
+    {
+        PumpPending();
+        m_wnd.TakePrimitiveCount();
+        const long long allocations = m_heap.GetCount();
+        Stopwatch watch;
+        action();
+        GdiFlush();
+        const double seconds = watch.Seconds();
+        measure.seconds.push_back(seconds);
+        measure.mostAllocations = std::max(measure.mostAllocations, m_heap.GetCount() - allocations);
+        measure.primitives = m_wnd.TakePrimitiveCount();
+        return seconds;
+    }
+
+    BenchDrawWnd& m_wnd;
+    HWND m_scrollee;
+    HeapCounter& m_heap;
+    Tavo_GrWRect m_bounds;
+    double m_deepLevel = 0.0;
+};
+
+void PrintMeasure(const Measure& m, double target)
+{
+    std::printf("  %-7s %9.2f ms  %8.4f  %6s  %10llu  %lld\n", m.name, Median(m.seconds) * 1000.0,
+                m.ratios.empty() ? 1.0 : Median(m.ratios), target > 0 ? (Median(m.ratios) <= target ? "met" : "MISSED") : "",
+                m.primitives, m.mostAllocations);
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    Options options;
+    if (!ParseOptions(argc, argv, options)) {
+        std::fprintf(stderr, "usage: paint_bench [--primitives N] [--runs R]\n");
+        return 2;
+    }
+    // Progress shows as it happens, also when the output goes to a file.
+    std::setvbuf(stdout, nullptr, _IONBF, 0);
+    Tavo_WiLibrary::Initialize();
+
+    std::printf("paint_bench: generating %d primitives ...\n", options.primitives);
+    Tavo_GrDrawing drawing;
+    BuildDrawing(GeneratePrimitives(options.primitives), drawing);
+
+    HostWindow host;
+    BenchDrawWnd wnd;
+    if (!host.IsValid() || !wnd.Create(WS_CHILD | WS_VISIBLE, CRect(0, 0, kViewWidth, kViewHeight), host.Wnd(), kDrawWndId)) {
+        std::fprintf(stderr, "paint_bench: no %d x %d drawing window\n", kViewWidth, kViewHeight);
+        return 1;
+    }
+    PumpPending();
+    HeapCounter heap;
+
+    // The first paint builds the drawing's index and makes room for every
+    // later pass; it is not measured.
+    PaintBench bench(wnd, drawing, heap);
+    const long long beforeFirst = heap.GetCount();
+    bench.Bind(drawing);
+    const long long firstAllocations = heap.GetCount() - beforeFirst;
+
+    CRect client;
+    GetClientRect(wnd.GetScrollee()->GetSafeHwnd(), &client);
+    std::printf("paint_bench: %d items in a %d x %d drawing window (scrollee %d x %d at the zero level), %d runs\n",
+                drawing.GetItemCount(), kViewWidth, kViewHeight, client.Width(), client.Height(), options.runs);
+
+    Measure full("full"), deep("deep"), scroll("scroll"), pan("pan");
+    double deepFraction = 0.0;
+    std::printf("\n run    full ms    deep    scroll    pan   (ratios to the full paint of the run)\n");
+    for (int run = 0; run < options.runs; ++run) {
+        const bool forward = run % 2 == 0;
+        bench.ShowZeroLevel();
+        const double f = bench.FullPaint(full);
+        deepFraction = bench.ShowDeepLevel();
+        const double d = bench.FullPaint(deep) / f;
+        bench.ShowFirstLevelIn();
+        const double s = bench.Scroll(scroll, forward) / f;
+        const double p = bench.PanStep(pan, forward) / f;
+        deep.ratios.push_back(d);
+        scroll.ratios.push_back(s);
+        pan.ratios.push_back(p);
+        std::printf(" %3d  %9.2f  %7.4f  %7.4f  %7.4f\n", run + 1, f * 1000.0, d, s, p);
+    }
+
+    std::printf("\nmedians of %d runs (deep level: %.2f %% of the drawing's area in view;"
+                " scroll and pan one level in):\n",
+                options.runs, deepFraction * 100.0);
+    std::printf("  action       time     ratio  target  primitives  most heap allocations\n");
+    PrintMeasure(full, 0.0);
+    PrintMeasure(deep, 0.02);
+    PrintMeasure(scroll, 0.12);
+    PrintMeasure(pan, 0.15);
+    if (heap.IsActive())
+        std::printf("heap allocations: %lld in the first paint (the drawing's index), at most %lld in any later"
+                    " measured action (%d modules watched)\n",
+                    firstAllocations,
+                    std::max({full.mostAllocations, deep.mostAllocations, scroll.mostAllocations, pan.mostAllocations}),
+                    heap.GetModuleCount());
+    else
+        std::printf("heap allocations: not counted (no allocation import found)\n");
+
+    wnd.SetDrawingInfo(nullptr, kMaxZoomLevel, kSurfaceOption, 0, 0, 0);
+    wnd.DestroyWindow();
+    Tavo_WiLibrary::Terminate(false);
+    return 0;
+}
