@@ -13,7 +13,7 @@ namespace {
 
 void SetArrowCursor()
 {
-    ::SetCursor(::LoadCursorA(nullptr, MAKEINTRESOURCEA(32512)));  // IDC_ARROW
+    ::SetCursor(::LoadCursor(nullptr, IDC_ARROW));
 }
 
 // The pan cursor from whichever module of the chain holds it: the library's
@@ -21,17 +21,21 @@ void SetArrowCursor()
 void SetPanCursor()
 {
     LPCSTR name = MAKEINTRESOURCEA(TAVO_WI_IDC_PAN);
-    HINSTANCE module = AfxFindResourceHandle(name, MAKEINTRESOURCEA(12));  // RT_GROUP_CURSOR
+    HINSTANCE module = AfxFindResourceHandle(name, RT_GROUP_CURSOR);
     if (HCURSOR cursor = ::LoadCursorA(module, name))
         ::SetCursor(cursor);
 }
 
-// Paint messages that scrolling left pending, as PumpPaintMessages takes them.
+// One pan or autoscroll step on one axis: a signed percentage of the view
+// scrolls towards positive or negative (the scroll window takes sizes, not
+// signs), and the strip it uncovered is painted at once so the view keeps up
+// with the pointer.
 void ScrollStep(Tavo_WiDrawWnd& wnd, int step, Tavo_WiScroll::Dir positive, Tavo_WiScroll::Dir negative)
 {
     if (step == 0)
         return;
-    wnd.ScrollWindow(step > 0 ? positive : negative, Tavo_WiScroll::Percent, step > 0 ? step : -step);
+    const int size = step > 0 ? step : Tavo_GrSaturate(-static_cast<long long>(step));
+    wnd.ScrollWindow(step > 0 ? positive : negative, Tavo_WiScroll::Percent, size);
     wnd.PumpPaintMessages();
 }
 
@@ -109,7 +113,8 @@ void Tavo_WiDrawWnd::OnDragStart(UINT button, UINT flags, const CPoint& point)
         DoDragAndDrop(button, flags, point);
         break;
     case Pan: {
-        // At the zero level the whole drawing is in view: nothing to pan.
+        // At the zero level the whole drawing is in view, and without a
+        // drawing there is no view: nothing to pan.
         if (!m_zoomedIn || !m_mapping)
             break;
         CRect window(0, 0, 0, 0);
@@ -154,6 +159,7 @@ void Tavo_WiDrawWnd::OnDragMove(UINT, UINT, const CPoint& point)
 
 void Tavo_WiDrawWnd::OnTimer(UINT_PTR id)
 {
+    // A derived window's own timers are not autoscroll ticks.
     if (id != AutoScrollTimerId) {
         CWnd::OnTimer(id);
         return;
@@ -215,6 +221,12 @@ UINT ButtonUpMessage(UINT button)
 
 void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& start)
 {
+    // Only the release of one of the three buttons ends the loop: with any
+    // other code it would hold the capture and every message of the thread
+    // for good, so no rectangle is run at all.
+    const UINT endMessage = ButtonUpMessage(button);
+    if (endMessage == 0)
+        return;
     Tavo_WiScrollee* scrollee = GetScrollee();
     CClientDC dc(scrollee);
     SetCapture();
@@ -222,7 +234,6 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
     CRect rect = Spanned(start, start);
     dc.DrawFocusRect(&rect);
 
-    const UINT endMessage = ButtonUpMessage(button);
     bool completed = false;
     for (;;) {
         MSG msg;
@@ -240,7 +251,7 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
             dc.DrawFocusRect(&rect);
             ::DispatchMessageA(&msg);
             dc.DrawFocusRect(&rect);
-        } else if (endMessage != 0 && msg.message == endMessage) {
+        } else if (msg.message == endMessage) {
             completed = true;
             break;
         } else if (msg.message == WM_MOUSEMOVE) {
@@ -258,6 +269,8 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
             break;
     }
     dc.DrawFocusRect(&rect);
+    // After a cancellation the capture belongs to the window that took it;
+    // ReleaseCapture would take it from that window as well.
     if (::GetCapture() == GetSafeHwnd())
         ::ReleaseCapture();
 

@@ -9,6 +9,7 @@
 #include "Tavo_GrDrawingBuilder.h"
 #include "Tavo_WiDrawWnd.h"
 
+#include <functional>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -16,7 +17,8 @@
 namespace DrawWndTest {
 
 // A drawing window with its own on-screen surface (switched off with
-// useSurface) that notes the application notifications it receives.
+// useSurface) that notes the application notifications it receives, and the
+// ends of drags.
 class TestDrawWnd : public Tavo_WiDrawWnd
 {
 public:
@@ -26,21 +28,33 @@ public:
         UINT button = 0;
         UINT flags = 0;
         Tavo_GrWRect rect;
+        HWND capture = nullptr;     // the window holding the mouse capture at the call
     };
 
     Tavo_WiNativeWindowSurface surface;
     bool useSurface = true;
+    Tavo_WiWin32Surface* printSurface = nullptr;    // handed out by GetPrintSurface; not owned
     std::vector<Note> notes;
     DragAction dragAction = Pan;
     CString dataTipText;
     int paints = 0;     // passes of the full paint path that reached the drawing
     Tavo_GrDRect lastPaintRect;     // the device rectangle the last of them repainted
+    std::function<void()> onPaint;  // run at each of those passes, before the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
+    Tavo_WiWin32Surface* GetPrintSurface() override { return printSurface; }
 
     // The protected and private parts the tests drive directly.
     using Tavo_WiDrawWnd::GetScrollDeviceDeltas;
     using Tavo_WiDrawWnd::SetDragScrollingFlag;
+
+    // Noted as "DragEnd" with the button, the flags and the point (as a
+    // one-point rectangle); then the window's own handling.
+    void OnDragEnd(UINT button, UINT flags, const CPoint& point, int completed) override
+    {
+        Note("DragEnd", button, flags, Tavo_GrWRect{point.x, point.y, point.x, point.y});
+        Tavo_WiDrawWnd::OnDragEnd(button, flags, point, completed);
+    }
 
 protected:
     void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc, Tavo_GrDrawing* drawing, Tavo_WiNativeWindowSurface* s,
@@ -48,6 +62,8 @@ protected:
     {
         ++paints;
         lastPaintRect = rect;
+        if (onPaint)
+            onPaint();
         Tavo_WiDrawWnd::OnDraw(scrollee, dc, drawing, s, mapping, rect);
     }
     using Tavo_WiDrawWnd::OnDraw;
@@ -77,7 +93,7 @@ protected:
 private:
     void Note(const char* name, UINT button, UINT flags, const Tavo_GrWRect& rect)
     {
-        notes.push_back({name, button, flags, rect});
+        notes.push_back({name, button, flags, rect, ::GetCapture()});
     }
 };
 
@@ -130,6 +146,10 @@ long DifferingPixels(const Picture& a, const Picture& b);
 inline void PrintTo(const Tavo_GrWRect& r, std::ostream* out)
 {
     *out << "(" << r.x1 << ", " << r.y1 << ", " << r.x2 << ", " << r.y2 << ")";
+}
+inline void PrintTo(const CSize& s, std::ostream* out)
+{
+    *out << s.cx << " x " << s.cy;
 }
 inline void PrintTo(const Tavo_GrDRect& r, std::ostream* out)
 {
