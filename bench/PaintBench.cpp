@@ -13,10 +13,16 @@
 //   scroll   a scroll by 10 % of the view (alternately right and left) and
 //            the repaint of its strip, one level in (the densest zoomed view);
 //   pan      one pan-drag step of 5 % of the view on both axes, one level in;
-// and the heap allocations of each of them. It prints the medians of the
-// times and of their ratios to the full paint of the same run.
+// and, to show where the time goes, two floors:
+//   erase    a full paint with no surface: the scrollee erases, nothing is
+//            drawn (what any full-view paint costs before the drawing);
+//   move     the scroll alone, its strip left unpainted (the pixels moved).
+// It prints the medians of the times and of their ratios to the full paint
+// of the same run, and the heap allocations of each action: those of the
+// library's own DLLs during the runs, those of the framework's DLL in one
+// more round.
 #include "BenchDrawing.h"
-#include "HeapCounter.h"
+#include "HeapCallCounter.h"
 
 #include "Tavo_GrDrawing.h"
 #include "Tavo_WiDrawWnd.h"
@@ -29,6 +35,8 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <initializer_list>
+#include <memory>
 #include <vector>
 
 namespace {
@@ -101,25 +109,55 @@ void PumpPending()
     }
 }
 
-// The drawing window with its own on-screen surface.
+// The drawing window with its own on-screen surface, which it can withhold
+// so that a paint only erases.
 class BenchDrawWnd : public Tavo_WiDrawWnd {
 public:
-    unsigned long long TakePrimitiveCount()
+    bool drawNothing = false;
+
+    // What the surface drew since the last call: primitives, and the
+    // attribute changes that rebuilt its pen and brush.
+    struct Work {
+        unsigned long long primitives = 0;
+        unsigned long long attributeChanges = 0;
+    };
+    Work TakeWork()
     {
         Tavo_GrSurfaceStats stats;
         m_surface.FetchStats(stats);
         m_surface.ResetStats();
-        unsigned long long count = 0;
+        Work work;
         for (int c = Tavo_GrSurfaceStats::Dots; c <= Tavo_GrSurfaceStats::Calls; ++c)
-            count += stats.Get(static_cast<Tavo_GrSurfaceStats::Counter>(c));
-        return count;
+            work.primitives += stats.Get(static_cast<Tavo_GrSurfaceStats::Counter>(c));
+        work.attributeChanges = stats.Get(Tavo_GrSurfaceStats::AttrChanges);
+        return work;
     }
 
 protected:
-    Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return &m_surface; }
+    Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return drawNothing ? nullptr : &m_surface; }
 
 private:
     Tavo_WiNativeWindowSurface m_surface;
+};
+
+// Counts the heap allocations of the named loaded modules while it lives.
+class ModuleHeapCounter {
+public:
+    explicit ModuleHeapCounter(std::initializer_list<const char*> names) : m_counter(Modules(names)) {}
+    bool IsCounting() const { return m_counter.IsCounting(); }
+    long long GetCount() const { return m_counter.GetCount(); }
+
+private:
+    static std::vector<HMODULE> Modules(std::initializer_list<const char*> names)
+    {
+        std::vector<HMODULE> modules;
+        for (const char* name : names)
+            if (const HMODULE module = GetModuleHandleA(name))
+                modules.push_back(module);
+        return modules;
+    }
+
+    HeapCallCounter m_counter;
 };
 
 // A borderless popup at the display's origin, the drawing window's parent.
@@ -155,14 +193,16 @@ private:
     CWnd m_wnd;
 };
 
-// One measured action: its times and heap allocations over the runs.
+// One measured action: its times, its heap allocations and what it drew.
 struct Measure {
-    explicit Measure(const char* n) : name(n) {}
+    Measure(const char* n, double t) : name(n), target(t) {}
     const char* name;
+    double target;                      // largest ratio to the full paint; 0: none
     std::vector<double> seconds;
-    std::vector<double> ratios;       // to the full paint of the same run
-    long long mostAllocations = 0;
-    unsigned long long primitives = 0;  // drawn by the last of them
+    std::vector<double> ratios;         // to the full paint of the same run
+    long long systemAllocations = 0;    // most in one action, by the library's DLLs
+    long long frameworkAllocations = 0; // most in one action, by the framework's DLL
+    BenchDrawWnd::Work work;            // drawn by the last one
 };
 
 // The area of the part of a rectangle that lies inside bounds.
@@ -180,8 +220,8 @@ double Area(const Tavo_GrWRect& r)
 
 class PaintBench {
 public:
-    PaintBench(BenchDrawWnd& wnd, const Tavo_GrDrawing& drawing, HeapCounter& heap)
-        : m_wnd(wnd), m_scrollee(wnd.GetScrollee()->GetSafeHwnd()), m_heap(heap)
+    PaintBench(BenchDrawWnd& wnd, Tavo_GrDrawing& drawing)
+        : m_wnd(wnd), m_scrollee(wnd.GetScrollee()->GetSafeHwnd()), m_drawing(drawing)
     {
         drawing.FetchBounds(m_bounds);
     }
@@ -189,13 +229,20 @@ public:
     // Binds the drawing and paints it once at the zero level: that first
     // pass builds the drawing's index. Chooses the deep level: the one at
     // which kDeepVisibleFraction of the drawing's area is in view.
-    void Bind(Tavo_GrDrawing& drawing)
+    void Bind()
     {
-        m_wnd.SetDrawingInfo(&drawing, kMaxZoomLevel, kSurfaceOption, 0, 0, 0);
+        m_wnd.SetDrawingInfo(&m_drawing, kMaxZoomLevel, kSurfaceOption, 0, 0, 0);
         UpdateWindow(m_scrollee);
         PumpPending();
         const double linear = std::sqrt(Area(m_wnd.GetWorldClipBox()) / (kDeepVisibleFraction * Area(m_bounds)));
         m_deepLevel = m_wnd.GetMapping()->GetLevelsPerDoubling() * std::log2(linear);
+    }
+
+    // Where the actions' heap allocations are counted from now on.
+    void CountAllocations(const ModuleHeapCounter& counter, long long Measure::*into)
+    {
+        m_heap = &counter;
+        m_allocations = into;
     }
 
     // The views to measure in. The zoom's own repaint is dropped where the
@@ -208,7 +255,9 @@ public:
     // Returns the part of the drawing's area in view.
     double ShowDeepLevel()
     {
-        m_wnd.ZoomWindow(m_deepLevel, (m_bounds.x1 + m_bounds.x2) / 2, (m_bounds.y1 + m_bounds.y2) / 2);
+        const int x = static_cast<int>((static_cast<long long>(m_bounds.x1) + m_bounds.x2) / 2);
+        const int y = static_cast<int>((static_cast<long long>(m_bounds.y1) + m_bounds.y2) / 2);
+        m_wnd.ZoomWindow(m_deepLevel, x, y);
         DropPendingPaint();
         return OverlapArea(m_wnd.GetWorldClipBox(), m_bounds) / Area(m_bounds);
     }
@@ -226,6 +275,25 @@ public:
             InvalidateRect(m_scrollee, nullptr, TRUE);
             UpdateWindow(m_scrollee);
         });
+    }
+
+    double Erase(Measure& measure)
+    {
+        m_wnd.drawNothing = true;
+        const double seconds = FullPaint(measure);
+        m_wnd.drawNothing = false;
+        return seconds;
+    }
+
+    // The scroll alone; its strip is painted afterwards, untimed.
+    double Move(Measure& measure, bool forward)
+    {
+        const double seconds = Timed(measure, [&] {
+            m_wnd.ScrollWindow(forward ? Tavo_WiScroll::Right : Tavo_WiScroll::Left, Tavo_WiScroll::Percent,
+                               kScrollPercent);
+        });
+        UpdateWindow(m_scrollee);
+        return seconds;
     }
 
     double Scroll(Measure& measure, bool forward)
@@ -265,30 +333,71 @@ private:
     double Timed(Measure& measure, Action action)
     {
         PumpPending();
-        m_wnd.TakePrimitiveCount();
-        const long long allocations = m_heap.GetCount();
+        m_wnd.TakeWork();
+        const long long before = m_heap->GetCount();
         Stopwatch watch;
         action();
         GdiFlush();
         const double seconds = watch.Seconds();
+        const long long allocations = m_heap->GetCount() - before;
         measure.seconds.push_back(seconds);
-        measure.mostAllocations = std::max(measure.mostAllocations, m_heap.GetCount() - allocations);
-        measure.primitives = m_wnd.TakePrimitiveCount();
+        measure.*m_allocations = std::max(measure.*m_allocations, allocations);
+        measure.work = m_wnd.TakeWork();
         return seconds;
     }
 
     BenchDrawWnd& m_wnd;
     HWND m_scrollee;
-    HeapCounter& m_heap;
+    Tavo_GrDrawing& m_drawing;
+    const ModuleHeapCounter* m_heap = nullptr;
+    long long Measure::*m_allocations = &Measure::systemAllocations;
     Tavo_GrWRect m_bounds;
     double m_deepLevel = 0.0;
 };
 
-void PrintMeasure(const Measure& m, double target)
+void PrintMeasure(const Measure& m)
 {
-    std::printf("  %-7s %9.2f ms  %8.4f  %6s  %10llu  %lld\n", m.name, Median(m.seconds) * 1000.0,
-                m.ratios.empty() ? 1.0 : Median(m.ratios), target > 0 ? (Median(m.ratios) <= target ? "met" : "MISSED") : "",
-                m.primitives, m.mostAllocations);
+    const bool reference = m.ratios.empty();
+    const double ratio = reference ? 1.0 : Median(m.ratios);
+    const char* verdict = m.target <= 0.0 ? "" : (ratio <= m.target ? "met" : "MISSED");
+    char target[16] = "";
+    if (m.target > 0.0)
+        std::snprintf(target, sizeof target, "%.2f", m.target);
+    std::printf("  %-7s %10.2f  %7.4f  %6s %-6s  %10llu  %9llu  %7lld  %9lld\n", m.name, Median(m.seconds) * 1000.0,
+                ratio, target, verdict, m.work.primitives, m.work.attributeChanges, m.systemAllocations,
+                m.frameworkAllocations);
+}
+
+// One round of every action; returns the ratios of this round.
+struct Round {
+    Measure* full;
+    Measure* erase;
+    Measure* deep;
+    Measure* scroll;
+    Measure* move;
+    Measure* pan;
+};
+
+void RunRound(PaintBench& bench, const Round& m, bool forward, bool keepRatios, double& deepFraction)
+{
+    bench.ShowZeroLevel();
+    const double f = bench.FullPaint(*m.full);
+    const double e = bench.Erase(*m.erase);
+    deepFraction = bench.ShowDeepLevel();
+    const double d = bench.FullPaint(*m.deep);
+    bench.ShowFirstLevelIn();
+    const double s = bench.Scroll(*m.scroll, forward);
+    const double v = bench.Move(*m.move, !forward);
+    const double p = bench.PanStep(*m.pan, forward);
+    if (!keepRatios)
+        return;
+    m.erase->ratios.push_back(e / f);
+    m.deep->ratios.push_back(d / f);
+    m.scroll->ratios.push_back(s / f);
+    m.move->ratios.push_back(v / f);
+    m.pan->ratios.push_back(p / f);
+    std::printf(" %3zu  %9.2f  %7.4f  %7.4f  %7.4f  %7.4f  %7.4f\n", m.deep->ratios.size(), f * 1000.0, d / f, s / f, p / f,
+                e / f, v / f);
 }
 
 } // namespace
@@ -315,52 +424,54 @@ int main(int argc, char** argv)
         return 1;
     }
     PumpPending();
-    HeapCounter heap;
 
+    // The library's own DLLs; the framework's is counted in a round of its
+    // own (one counter at a time).
+    auto systemHeap = std::make_unique<ModuleHeapCounter>(std::initializer_list<const char*>{"libTavo_Windows.dll", "libTavo_Core.dll"});
+    PaintBench bench(wnd, drawing);
     // The first paint builds the drawing's index and makes room for every
     // later pass; it is not measured.
-    PaintBench bench(wnd, drawing, heap);
-    const long long beforeFirst = heap.GetCount();
-    bench.Bind(drawing);
-    const long long firstAllocations = heap.GetCount() - beforeFirst;
+    const long long beforeFirst = systemHeap->GetCount();
+    bench.Bind();
+    const long long firstAllocations = systemHeap->GetCount() - beforeFirst;
 
     CRect client;
     GetClientRect(wnd.GetScrollee()->GetSafeHwnd(), &client);
     std::printf("paint_bench: %d items in a %d x %d drawing window (scrollee %d x %d at the zero level), %d runs\n",
                 drawing.GetItemCount(), kViewWidth, kViewHeight, client.Width(), client.Height(), options.runs);
 
-    Measure full("full"), deep("deep"), scroll("scroll"), pan("pan");
+    Measure full("full", 0.0), erase("erase", 0.0), deep("deep", 0.02), scroll("scroll", 0.12), move("move", 0.0),
+        pan("pan", 0.15);
+    const Round round{&full, &erase, &deep, &scroll, &move, &pan};
     double deepFraction = 0.0;
-    std::printf("\n run    full ms    deep    scroll    pan   (ratios to the full paint of the run)\n");
-    for (int run = 0; run < options.runs; ++run) {
-        const bool forward = run % 2 == 0;
-        bench.ShowZeroLevel();
-        const double f = bench.FullPaint(full);
-        deepFraction = bench.ShowDeepLevel();
-        const double d = bench.FullPaint(deep) / f;
-        bench.ShowFirstLevelIn();
-        const double s = bench.Scroll(scroll, forward) / f;
-        const double p = bench.PanStep(pan, forward) / f;
-        deep.ratios.push_back(d);
-        scroll.ratios.push_back(s);
-        pan.ratios.push_back(p);
-        std::printf(" %3d  %9.2f  %7.4f  %7.4f  %7.4f\n", run + 1, f * 1000.0, d, s, p);
-    }
+    std::printf("\n run    full ms     deep   scroll      pan    erase     move   (ratios to the full paint of the run)\n");
+    bench.CountAllocations(*systemHeap, &Measure::systemAllocations);
+    for (int run = 0; run < options.runs; ++run)
+        RunRound(bench, round, run % 2 == 0, true, deepFraction);
+    const bool systemCounted = systemHeap->IsCounting();
+    systemHeap.reset();
 
-    std::printf("\nmedians of %d runs (deep level: %.2f %% of the drawing's area in view;"
-                " scroll and pan one level in):\n",
+    // The framework's round, in measures of its own so that its times stay
+    // out of the medians.
+    std::vector<Measure> extra(6, Measure("", 0.0));
+    const Round frameworkRound{&extra[0], &extra[1], &extra[2], &extra[3], &extra[4], &extra[5]};
+    const ModuleHeapCounter frameworkHeap({"afx.dll"});
+    bench.CountAllocations(frameworkHeap, &Measure::frameworkAllocations);
+    RunRound(bench, frameworkRound, true, false, deepFraction);
+    Measure* const measures[] = {&full, &erase, &deep, &scroll, &move, &pan};
+    for (size_t i = 0; i < extra.size(); ++i)
+        measures[i]->frameworkAllocations = extra[i].frameworkAllocations;
+
+    std::printf("\nmedians of %d runs (deep level: %.2f %% of the drawing's area in view; scroll, move and pan one"
+                " level in):\n",
                 options.runs, deepFraction * 100.0);
-    std::printf("  action       time     ratio  target  primitives  most heap allocations\n");
-    PrintMeasure(full, 0.0);
-    PrintMeasure(deep, 0.02);
-    PrintMeasure(scroll, 0.12);
-    PrintMeasure(pan, 0.15);
-    if (heap.IsActive())
-        std::printf("heap allocations: %lld in the first paint (the drawing's index), at most %lld in any later"
-                    " measured action (%d modules watched)\n",
-                    firstAllocations,
-                    std::max({full.mostAllocations, deep.mostAllocations, scroll.mostAllocations, pan.mostAllocations}),
-                    heap.GetModuleCount());
+    std::printf("                                           drawn by the last one   heap allocations\n");
+    std::printf("  action    time ms    ratio  target         primitives  attributes  library  framework\n");
+    for (const Measure* m : {&full, &deep, &scroll, &pan, &erase, &move})
+        PrintMeasure(*m);
+    if (systemCounted && frameworkHeap.IsCounting())
+        std::printf("heap allocations of the library's DLLs in the first paint (the drawing's index): %lld\n",
+                    firstAllocations);
     else
         std::printf("heap allocations: not counted (no allocation import found)\n");
 

@@ -59,9 +59,9 @@ CRect PendingUpdate(HWND window)
     return box;
 }
 
-Picture Snapshot(HWND window)
+ClientPicture Snapshot(HWND window)
 {
-    Picture picture;
+    ClientPicture picture;
     CRect client(0, 0, 0, 0);
     ::GetClientRect(window, &client);
     picture.width = client.Width();
@@ -94,7 +94,7 @@ Picture Snapshot(HWND window)
     return picture;
 }
 
-long DifferingPixels(const Picture& a, const Picture& b)
+long DifferingPixels(const ClientPicture& a, const ClientPicture& b)
 {
     if (a.width != b.width || a.height != b.height)
         return static_cast<long>(std::max(a.pixels.size(), b.pixels.size()));

@@ -128,7 +128,7 @@ void PaintNow(HWND window);
 CRect PendingUpdate(HWND window);
 
 // A window's client area as on screen, row by row from the top, 0x00RRGGBB.
-struct Picture
+struct ClientPicture
 {
     int width = 0;
     int height = 0;
@@ -136,10 +136,10 @@ struct Picture
 
     unsigned int At(int x, int y) const { return pixels[static_cast<size_t>(y) * width + x]; }
 };
-Picture Snapshot(HWND window);
+ClientPicture Snapshot(HWND window);
 // How many pixels of two pictures of the same size differ (all of them when
 // the sizes differ).
-long DifferingPixels(const Picture& a, const Picture& b);
+long DifferingPixels(const ClientPicture& a, const ClientPicture& b);
 
 }  // namespace DrawWndTest
 

@@ -45,12 +45,18 @@ struct HalvesDrawing
     Tavo_GrDrawing drawing;
 };
 
-// Lines, circles and rectangles of many colours over 1000 x 800 world
-// units, so that a strip cut anywhere crosses shapes whose pixels must meet
-// the moved ones exactly.
+// Lines, circles, rectangles and text of many colours and sizes over 1000 x
+// 800 world units, so that a strip cut anywhere crosses shapes and words
+// whose pixels must meet the moved ones exactly.
 struct BusyDrawing
 {
     BusyDrawing()
+    {
+        AddShapes();
+        AddLabels();
+    }
+
+    void AddShapes()
     {
         Tavo_GrDrawingBuilder build(drawing);
         build.BeginLayer("busy");
@@ -67,6 +73,28 @@ struct BusyDrawing
             }
         }
     }
+
+    // Words every 40 units, of heights from below the smallest font to
+    // several lines, in every alignment, and wrapped text boxes.
+    void AddLabels()
+    {
+        static const char alignments[] = {
+            Tavo_GrAttr::AlignLeft | Tavo_GrAttr::AlignBottom, Tavo_GrAttr::AlignRight | Tavo_GrAttr::AlignTop,
+            Tavo_GrAttr::AlignCentre | Tavo_GrAttr::AlignMiddle, Tavo_GrAttr::AlignLeft | Tavo_GrAttr::AlignTop};
+        Tavo_GrDrawingBuilder build(drawing);
+        build.BeginLayer("labels");
+        int n = 0;
+        for (int x = 0; x < 1000; x += 40) {
+            for (int y = 10; y < 800; y += 40, ++n) {
+                build.SetAttr(Tavo_GrAttr(static_cast<char>(n % 15), 0, 4 + (n * 7) % 40, alignments[n % 4]));
+                if (n % 5 == 0)
+                    build.AddTextBox({x, y, x + 90, y + 35}, "Wrapped words in a box");
+                else
+                    build.AddText(x, y, n % 2 ? "Mgjy" : "W|q");
+            }
+        }
+    }
+
     Tavo_GrDrawing drawing;
 };
 
@@ -529,7 +557,7 @@ TEST_F(DrawWndViewTest, ScrollByTheBarRepaintsOnlyTheUncoveredStripAsAFullRepain
         const Tavo_GrDRect device = Wnd().lastPaintRect;
         EXPECT_EQ(CRect(device.xmin, size.cy - device.ymax, device.xmax, size.cy - device.ymin), strip);
 
-        const Picture scrolled = Snapshot(Scrollee());
+        const ClientPicture scrolled = Snapshot(Scrollee());
         ::InvalidateRect(Scrollee(), nullptr, TRUE);
         PaintNow(Scrollee());
         EXPECT_EQ(DifferingPixels(scrolled, Snapshot(Scrollee())), 0) << step.code;
