@@ -18,9 +18,14 @@
 //            drawn (what any full-view paint costs before the drawing);
 //   move     the scroll alone, its strip left unpainted (the pixels moved).
 // It prints the medians of the times and of their ratios to the full paint
-// of the same run, and the heap allocations of each action: those of the
-// library's own DLLs during the runs, those of the framework's DLL in one
-// more round.
+// of the same run, what the surface drew (primitives, and the attribute
+// changes that made it rebuild its pen and brush), and the heap allocations
+// of each action: those of the library's own DLLs during the runs, those of
+// the framework's DLL in one more round.
+//
+// --one-colour draws every primitive outlined in one colour: the same shapes
+// without a single attribute change, to tell the cost of attribute changes
+// from the cost of the shapes.
 #include "BenchDrawing.h"
 #include "HeapCallCounter.h"
 
@@ -53,15 +58,22 @@ const double kDeepVisibleFraction = 0.01;
 const int kScrollPercent = 10;
 // A pan step: the pointer moves this percentage of the view on each axis.
 const int kPanPercent = 5;
+// The palette index of --one-colour (red).
+const char kOneColour = 4;
 
 struct Options {
     int primitives = kDefaultPrimitives;
     int runs = kDefaultRuns;
+    bool oneColour = false;
 };
 
 bool ParseOptions(int argc, char** argv, Options& options)
 {
     for (int i = 1; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--one-colour") == 0) {
+            options.oneColour = true;
+            continue;
+        }
         const bool isPrimitives = std::strcmp(argv[i], "--primitives") == 0;
         const bool isRuns = std::strcmp(argv[i], "--runs") == 0;
         if ((!isPrimitives && !isRuns) || i + 1 >= argc)
@@ -406,16 +418,25 @@ int main(int argc, char** argv)
 {
     Options options;
     if (!ParseOptions(argc, argv, options)) {
-        std::fprintf(stderr, "usage: paint_bench [--primitives N] [--runs R]\n");
+        std::fprintf(stderr, "usage: paint_bench [--primitives N] [--runs R] [--one-colour]\n");
         return 2;
     }
     // Progress shows as it happens, also when the output goes to a file.
     std::setvbuf(stdout, nullptr, _IONBF, 0);
     Tavo_WiLibrary::Initialize();
 
-    std::printf("paint_bench: generating %d primitives ...\n", options.primitives);
+    std::printf("paint_bench: generating %d primitives%s ...\n", options.primitives,
+                options.oneColour ? ", all outlined in one colour" : "");
+    std::vector<BenchPrimitive> primitives = GeneratePrimitives(options.primitives);
+    if (options.oneColour) {
+        for (BenchPrimitive& p : primitives) {
+            p.colour = kOneColour;
+            p.fill = 0;
+        }
+    }
     Tavo_GrDrawing drawing;
-    BuildDrawing(GeneratePrimitives(options.primitives), drawing);
+    BuildDrawing(primitives, drawing);
+    primitives = {};
 
     HostWindow host;
     BenchDrawWnd wnd;
