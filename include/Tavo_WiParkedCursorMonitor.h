@@ -53,6 +53,8 @@ protected:
     DECLARE_MESSAGE_MAP()
 
 private:
+    // The window's own Create replaces the general one, which stays out of reach.
+    using CWnd::Create;
     void StartParkTimer();
     void StopParkTimer();
     void StartParkedCursor();

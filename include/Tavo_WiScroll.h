@@ -1,8 +1,12 @@
 // Tavo_WiScroll: the direction and the amount of a programmatic scroll
-// (Tavo_WiScrollWnd::ScrollWindow and ScrollWindowTest).
+// (Tavo_WiScrollWnd::ScrollWindow and ScrollWindowTest), and the bars' limit.
 #pragma once
 
 namespace Tavo_WiScroll {
+
+// The longest scroll bar range; longer scroll-unit ranges are compressed by a
+// scale factor onto it.
+constexpr int MaxBarRange = 32767;
 
 // Which bar a scroll moves, and which way: Left and Up go backwards (towards
 // the range minimum, or the range maximum for y in inverted-Y mode), Right and

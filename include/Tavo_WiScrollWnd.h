@@ -4,8 +4,8 @@
 // horizontal and a vertical scroll bar (1001, 1002) and a blank button in the
 // corner between them (1003). It keeps the scroll model in the caller's own
 // scroll units (range, visible window extent, position), maps it onto the
-// bars, whose ranges it keeps within 32767 bar units by a scale factor, and
-// moves the scrollee's pixels when the position changes.
+// bars, whose ranges it keeps within Tavo_WiScroll::MaxBarRange bar units by
+// a scale factor, and moves the scrollee's pixels when the position changes.
 //
 // A derived class overrides the virtual operations to draw (OnDraw), to turn
 // scroll units into pixels (GetScrollDeviceDeltas), and to react to clicks,
@@ -30,8 +30,6 @@ public:
     static constexpr UINT HorzBarId = 1001;
     static constexpr UINT VertBarId = 1002;
     static constexpr UINT CornerId = 1003;
-    // The longest bar range; longer scroll-unit ranges are compressed by the scale.
-    static constexpr int MaxBarRange = 32767;
     // Scroll codes beyond the platform's: back and forward by a percentage of
     // the window extent (OnHScroll, OnVScroll, ScrollWindow).
     static constexpr UINT PercentBack = 100;
@@ -46,6 +44,10 @@ public:
     virtual bool ScrollWindowTest(Tavo_WiScroll::Dir dir, Tavo_WiScroll::Amount amount, int n);
 
 private:
+    // Its own slot of the table (it takes a CRect, so it does not override
+    // the framework's Create); the framework's form stays reachable only
+    // through it, as before.
+    using CWnd::Create;
     virtual BOOL Create(LPCSTR className, LPCSTR windowName, DWORD style, const CRect& rect,
                         CWnd* parent, UINT id, CCreateContext* context);
 
@@ -141,8 +143,11 @@ private:
     void DecideBarVisibility(int clientWidth, int clientHeight);
     void BeginThumbDrag();
     void EndScrollAction();
-    void ScrollToX(int x);
-    void ScrollToY(int y);
+    enum class Axis { Horizontal, Vertical };
+    // The scroll codes of either bar (OnHScroll, OnVScroll).
+    void OnScroll(Axis axis, UINT code, UINT n, CScrollBar* bar);
+    // Moves the position on one axis and reports the move of a drag scroll.
+    void ScrollTo(Axis axis, int value);
 
     double m_horzScale = 1.0;           // scroll units per horizontal bar unit, at least 1
     double m_vertScale = 1.0;

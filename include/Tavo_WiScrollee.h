@@ -81,6 +81,8 @@ protected:
     DECLARE_MESSAGE_MAP()
 
 private:
+    // The window's own Create replaces the general one, which stays out of reach.
+    using CWnd::Create;
     BOOL Create(LPCSTR className, LPCSTR windowName, DWORD style, const CRect& rect, CWnd* parent,
                 UINT id, CCreateContext* context);
     // The parent window as the scroll window it is, or null when the parent

@@ -11,21 +11,34 @@
 // Draw(surface, mapping, clip) calls the surface as Tavo_GrSurface.h describes.
 // Item coordinates are turned into device coordinates by the mapping's
 // transform (a circle's radius and a text box's font height are scaled and
-// rounded); only items whose world bounds meet the clip are visited. The clip is
-// the device rectangle given (or the whole device window when none is given;
-// everything when the device window is empty too), widened by kClipMarginPixels
-// on every side for the pixels a surface may draw beyond an item's exact
-// extent, and inverted through the transform. A spatial index, built once per
-// layer at the first pass after items were added, finds those items, so a pass
-// over a small part of a large drawing costs in proportion to what it visits.
-// That first pass also makes room for everything a pass may need, so later
-// passes allocate no memory (until items are added again).
+// rounded); only items whose world bounds meet the clip are visited, and items
+// holding text when what the surface may draw for their text meets it (below).
+// The clip is the device rectangle given (or the whole device window when none
+// is given; everything when the device window is empty too), widened by
+// kClipMarginPixels on every side for the pixels a surface may draw beyond an
+// item's exact extent, and inverted through the transform. Spatial indexes,
+// built once per layer at the first pass after items were added, find those
+// items, so a pass over a small part of a large drawing costs in proportion to
+// what it visits. That first pass also makes room for everything a pass may
+// need, so later passes allocate no memory (until items are added again).
 //
 // World bounds of an item: its points (a circle: centre +- radius; a text at a
 // point: a box of length x charHeight by charHeight on each side of the point's
 // baseline, placed by the horizontal alignment; a text box: the box; a call: the
 // called drawing's bounds at the call's offset, as they were when the call was
 // added).
+//
+// Text is drawn beyond those bounds, so text is culled by where it may be
+// drawn. With E the character height, raised to the surface's smallest text
+// height (Tavo_GrSurface::GetMinTextPixels) where it scales to less: a text
+// at a point may be drawn within a box of length x E by 1.5 E on each side of
+// its baseline, placed by the horizontal alignment (a surface may set a cell E
+// high up to half a cell off the baseline); a text box's lines start at the
+// box's left edge by the horizontal alignment (right- and centre-aligned lines
+// lie left of it), are no wider than the box or 3 E or, below the smallest
+// height, the whole text at E, and reach at most 2 E below the box. A call of
+// a drawing that held text when the call was added is found by its bounds
+// widened by as much as the text of its layer may reach.
 //
 // A drawing is not thread-safe: draw it from one thread at a time.
 #pragma once

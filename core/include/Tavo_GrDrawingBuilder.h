@@ -22,6 +22,10 @@
 
 #include <cstdint>
 
+namespace Tavo_GrText {
+struct Facts;
+}
+
 class TAVO_CORE_API Tavo_GrDrawingBuilder {
 public:
     explicit Tavo_GrDrawingBuilder(Tavo_GrDrawing& drawing);
@@ -62,7 +66,9 @@ private:
     // the drawing's attribute table (added when it changed since the last item).
     Tavo_GrLayerData& CurrentLayer();
     uint32_t CurrentAttrIndex();
-    bool AddItem(int kind, const Tavo_GrWPoint* points, int pointCount, int count, const Tavo_GrWRect& bounds);
+    // text: for an item that holds text, what the pass needs to know of it.
+    bool AddItem(int kind, const Tavo_GrWPoint* points, int pointCount, int count, const Tavo_GrWRect& bounds,
+                 const Tavo_GrText::Facts* text = nullptr);
 
     Tavo_GrDrawing& m_drawing;
     Tavo_GrAttr m_attr;

@@ -32,7 +32,7 @@
 // holds: the transform and scale of the pass, H, the attribute's colour, fill,
 // character height and alignment (GetCurrent...), the hollow flag, the
 // interrupted flag, and the settings (thickening gate, surface option,
-// screen-paint flag), which the pass does not touch.
+// screen-paint flag, smallest text height), which the pass does not touch.
 //
 // Every 256 items (kPollInterval) the drawing calls PollDrawInterrupt, and it
 // checks the interrupted flag after every item; once the flag is set it draws
@@ -123,6 +123,13 @@ public:
     // Whether the pass paints a window on screen (default false).
     bool IsScreenPaint() const { return m_screenPaint; }
     void SetScreenPaintFlag(int screenPaint) { m_screenPaint = screenPaint != 0; }
+    // The smallest text height, in device pixels, the surface draws: text
+    // whose character height scales to less is drawn this high (or as a line
+    // no longer than that), so the pass looks that much further for text
+    // beside the clip (Tavo_GrDrawing.h). Default 0: text is drawn at its
+    // scaled height; a value below 0 counts as 0.
+    int GetMinTextPixels() const { return m_minTextPixels; }
+    void SetMinTextPixels(int pixels) { m_minTextPixels = pixels > 0 ? pixels : 0; }
     // The drawing of the pass in progress (null outside BeginDrawing/EndDrawing).
     const Tavo_GrDrawing* GetDrawing() const { return m_drawing; }
 
@@ -141,6 +148,7 @@ private:
     double m_thickenGate = 1.0;
     int m_surfaceOption = 0;
     bool m_screenPaint = false;
+    int m_minTextPixels = 0;
 
     Tavo_GrAttr m_currentAttr;
     bool m_hasCurrentAttr = false;

@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <climits>
+#include <cstring>
 
 namespace {
 
@@ -198,7 +199,16 @@ void PrepareLayer(Tavo_GrDrawingData& data, Tavo_GrLayerData& layer)
 {
     if (layer.spatialIndex.IsBuilt())
         return;
-    layer.spatialIndex.Build(layer.bounds);
+    if (layer.textFacts.Any()) {
+        std::vector<uint32_t> plain;
+        std::vector<uint32_t> text;
+        for (uint32_t i = 0; i < layer.items.size(); ++i)
+            (layer.items[i].holdsText ? text : plain).push_back(i);
+        layer.spatialIndex.Build(layer.bounds, std::move(plain));
+        layer.textIndex.Build(layer.bounds, std::move(text));
+    } else {
+        layer.spatialIndex.Build(layer.bounds);
+    }
     layer.hits.reserve(layer.items.size());
     layer.marks.assign(layer.items.size(), 0);
     data.devicePoints.reserve(data.largestPointCount);
@@ -222,8 +232,49 @@ bool DrawAllItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, const Tavo_
     return true;
 }
 
+// Whether what the item holding text may draw meets the clip. A call is found
+// by its bounds widened as far as any text of the layer reaches, which holds
+// the text of the called drawing; that drawing's own pass culls its items.
+bool TextMeets(const Tavo_GrDrawingData& data, const Tavo_GrLayerData& layer, uint32_t index,
+               const Tavo_GrWRect& clip, double floor)
+{
+    const Tavo_GrWRect& bounds = layer.bounds[index];
+    if (Tavo_GrIntersects(bounds, clip))
+        return true;
+    const Tavo_GrItem& item = layer.items[index];
+    if (item.kind != Tavo_GrItemKind::Text && item.kind != Tavo_GrItemKind::TextBox)
+        return true;
+    const Tavo_GrAttr& attr = data.attrs[item.attr];
+    const int length = Tavo_GrSaturate(static_cast<long long>(std::strlen(data.texts.data() + item.count)));
+    const int height = attr.GetCharHeight();
+    const char align = attr.GetTextAlign();
+    const Tavo_GrWRect extent = item.kind == Tavo_GrItemKind::Text
+        ? Tavo_GrText::PointExtent(bounds, data.points[item.points], height, length, align, floor)
+        : Tavo_GrText::BoxExtent(bounds, height, length, align, floor);
+    return Tavo_GrIntersects(extent, clip);
+}
+
+// Appends to hits the items holding text whose text may be drawn inside the
+// clip: those the text index finds within the clip widened by the farthest
+// the layer's text reaches, each then checked by its own extent.
+void FindTextItems(const Tavo_GrSurface& surface, const Tavo_GrDrawingData& data, const Tavo_GrLayerData& layer,
+                   const Tavo_GrWRect& clip, std::vector<uint32_t>& hits)
+{
+    const double floor = Tavo_GrText::Floor(surface.GetMinTextPixels(), surface.GetScale());
+    const Tavo_GrWPoint reach = layer.textFacts.Reach(floor);
+    const Tavo_GrWRect area{Tavo_GrSubtract(clip.x1, reach.x), Tavo_GrSubtract(clip.y1, reach.y),
+                            Tavo_GrAdd(clip.x2, reach.x), Tavo_GrAdd(clip.y2, reach.y)};
+    const size_t first = hits.size();
+    layer.textIndex.Query(area, layer.bounds, hits);
+    size_t kept = first;
+    for (size_t i = first; i < hits.size(); ++i)
+        if (TextMeets(data, layer, hits[i], clip, floor))
+            hits[kept++] = hits[i];
+    hits.resize(kept); // shrinking: no allocation
+}
+
 // The items of the layer that meet the surface's world clip, in order, found
-// through the spatial index. Returns false once the pass is interrupted.
+// through the spatial indexes. Returns false once the pass is interrupted.
 template <typename KeepGoing>
 bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_GrLayerData& layer, KeepGoing keepGoing,
                       const Tavo_GrWRect& clip)
@@ -240,6 +291,8 @@ bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_Gr
 
     hits.clear();
     layer.spatialIndex.Query(clip, layer.bounds, hits);
+    if (layer.textFacts.Any())
+        FindTextItems(surface, data, layer, clip, hits);
     bool going = true;
     if (hits.size() * kMarkingShare < layer.items.size()) {
         std::sort(hits.begin(), hits.end());

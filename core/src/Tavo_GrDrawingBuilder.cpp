@@ -2,6 +2,7 @@
 #include "Tavo_GrDrawingBuilder.h"
 
 #include "Tavo_GrDrawingData.h"
+#include "Tavo_GrRound.h"
 
 #include <algorithm>
 #include <climits>
@@ -87,13 +88,18 @@ uint32_t Tavo_GrDrawingBuilder::CurrentAttrIndex()
 }
 
 bool Tavo_GrDrawingBuilder::AddItem(int kind, const Tavo_GrWPoint* points, int pointCount, int count,
-                                    const Tavo_GrWRect& bounds)
+                                    const Tavo_GrWRect& bounds, const Tavo_GrText::Facts* text)
 {
     Tavo_GrDrawingData& data = *m_drawing.m_data;
     Tavo_GrLayerData& layer = CurrentLayer();
 
     Tavo_GrItem item;
     item.kind = static_cast<Tavo_GrItemKind>(kind);
+    if (text && text->Any()) {
+        item.holdsText = true;
+        layer.textFacts.Add(*text);
+        data.textFacts.Add(*text);
+    }
     item.attr = CurrentAttrIndex();
     item.points = static_cast<uint32_t>(data.points.size());
     item.count = count;
@@ -104,6 +110,7 @@ bool Tavo_GrDrawingBuilder::AddItem(int kind, const Tavo_GrWPoint* points, int p
     layer.items.push_back(item);
     layer.bounds.push_back(bounds);
     layer.spatialIndex.Clear();
+    layer.textIndex.Clear();
 
     data.bounds = data.itemCount == 0 ? bounds
                                       : Tavo_GrWRect{std::min(data.bounds.x1, bounds.x1), std::min(data.bounds.y1, bounds.y1),
@@ -171,6 +178,11 @@ int32_t PoolText(std::vector<char>& pool, const char* text)
     return offset;
 }
 
+int TextLength(const char* text)
+{
+    return text ? Tavo_GrSaturate(static_cast<long long>(std::strlen(text))) : 0;
+}
+
 } // namespace
 
 bool Tavo_GrDrawingBuilder::AddText(int x, int y, const char* text)
@@ -187,7 +199,9 @@ bool Tavo_GrDrawingBuilder::AddText(int x, int y, const char* text)
     const Tavo_GrWRect box{Clamp(left), Clamp(y - height), Clamp(left + width), Clamp(y + height)};
     const Tavo_GrWPoint p{x, y};
     const int32_t offset = PoolText(m_drawing.m_data->texts, text);
-    return AddItem(static_cast<int>(Tavo_GrItemKind::Text), &p, 1, offset, box);
+    Tavo_GrText::Facts facts;
+    facts.AddPointText(m_attr.GetCharHeight(), TextLength(text));
+    return AddItem(static_cast<int>(Tavo_GrItemKind::Text), &p, 1, offset, box, &facts);
 }
 
 bool Tavo_GrDrawingBuilder::AddTextBox(const Tavo_GrWRect& box, const char* text)
@@ -195,7 +209,9 @@ bool Tavo_GrDrawingBuilder::AddTextBox(const Tavo_GrWRect& box, const char* text
     const Tavo_GrWRect b = Normalised(box.x1, box.y1, box.x2, box.y2);
     const Tavo_GrWPoint p[2] = {{b.x1, b.y1}, {b.x2, b.y2}};
     const int32_t offset = PoolText(m_drawing.m_data->texts, text);
-    return AddItem(static_cast<int>(Tavo_GrItemKind::TextBox), p, 2, offset, b);
+    Tavo_GrText::Facts facts;
+    facts.AddBoxText(b, m_attr.GetCharHeight(), TextLength(text), m_attr.GetTextAlign());
+    return AddItem(static_cast<int>(Tavo_GrItemKind::TextBox), p, 2, offset, b, &facts);
 }
 
 bool Tavo_GrDrawingBuilder::Calls(const Tavo_GrDrawing& from, const Tavo_GrDrawing* target, int depth)
@@ -220,5 +236,7 @@ bool Tavo_GrDrawingBuilder::AddCall(const Tavo_GrDrawing* drawing, int dx, int d
     const Tavo_GrWRect box{Clamp(static_cast<long long>(called.x1) + dx), Clamp(static_cast<long long>(called.y1) + dy),
                            Clamp(static_cast<long long>(called.x2) + dx), Clamp(static_cast<long long>(called.y2) + dy)};
     data.calls.emplace_back(drawing, dx, dy, kind);
-    return AddItem(static_cast<int>(Tavo_GrItemKind::Call), nullptr, 0, static_cast<int>(data.calls.size()) - 1, box);
+    // The called drawing's text may reach beyond its bounds as its own does.
+    return AddItem(static_cast<int>(Tavo_GrItemKind::Call), nullptr, 0, static_cast<int>(data.calls.size()) - 1, box,
+                   &drawing->m_data->textFacts);
 }

@@ -2,9 +2,10 @@
 // draws it) and Tavo_GrDrawingBuilder (which fills it). Not part of the
 // core's interface.
 //
-// An item is 16 bytes: its kind, its attribute (an index into the drawing's
-// attribute table), where its points start in the drawing's point pool and one
-// more number whose meaning depends on the kind:
+// An item is 16 bytes: its kind, whether it holds text (a text, a text box, or
+// a call of a drawing that held text when the call was added), its attribute
+// (an index into the drawing's attribute table), where its points start in the
+// drawing's point pool and one more number whose meaning depends on the kind:
 //
 //   kind       points                       count
 //   Dot        1                            -
@@ -22,6 +23,7 @@
 #include "Tavo_GrAttr.h"
 #include "Tavo_GrDrawing.h"
 #include "Tavo_GrSpatialIndex.h"
+#include "Tavo_GrTextReach.h"
 #include "Tavo_GrTypes.h"
 
 #include <cstdint>
@@ -33,10 +35,12 @@ enum class Tavo_GrItemKind : uint8_t { Dot, Line, Polyline, Polygon, Rect, Circl
 
 struct Tavo_GrItem {
     Tavo_GrItemKind kind = Tavo_GrItemKind::Dot;
+    bool holdsText = false;
     uint32_t attr = 0;
     uint32_t points = 0;
     int32_t count = 0;
 };
+static_assert(sizeof(Tavo_GrItem) == 16, "an item stays 16 bytes");
 
 struct Tavo_GrLayerData {
     std::string name;
@@ -45,9 +49,14 @@ struct Tavo_GrLayerData {
     std::vector<Tavo_GrItem> items;
     std::vector<Tavo_GrWRect> bounds; // one per item
     Tavo_GrWRect extent;              // of all items (valid when there are items)
+    // Of the items that hold text: text may be drawn beyond its bounds.
+    Tavo_GrText::Facts textFacts;
 
-    // Built at the first Draw after items were added (cleared by adding).
+    // Built at the first Draw after items were added (cleared by adding): one
+    // index of the items without text, found by their bounds, and one of the
+    // items that hold text, found by where their text may be drawn.
     Tavo_GrSpatialIndex spatialIndex;
+    Tavo_GrSpatialIndex textIndex;
     // The items a pass visits, kept between passes so that passes do not
     // allocate; busy while a pass walks them (a pass started inside that pass
     // uses storage of its own).
@@ -67,6 +76,8 @@ struct Tavo_GrDrawingData {
     Tavo_GrWRect bounds;
     int itemCount = 0;
     int largestPointCount = 0; // of the polylines and polygons
+    // Of all text in the drawing, for the layers of drawings that call it.
+    Tavo_GrText::Facts textFacts;
 
     // Device points of the polyline or polygon being drawn.
     std::vector<Tavo_GrDPoint> devicePoints;

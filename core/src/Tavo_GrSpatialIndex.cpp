@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 namespace {
 
@@ -44,14 +45,20 @@ void Tavo_GrSpatialIndex::Clear()
 
 void Tavo_GrSpatialIndex::Build(const std::vector<Tavo_GrWRect>& bounds)
 {
+    std::vector<uint32_t> items(bounds.size());
+    for (uint32_t i = 0; i < items.size(); ++i)
+        items[i] = i;
+    Build(bounds, std::move(items));
+}
+
+void Tavo_GrSpatialIndex::Build(const std::vector<Tavo_GrWRect>& bounds, std::vector<uint32_t> items)
+{
     Clear();
     m_built = true;
-    if (bounds.empty())
+    if (items.empty())
         return;
 
-    m_order.resize(bounds.size());
-    for (uint32_t i = 0; i < m_order.size(); ++i)
-        m_order[i] = i;
+    m_order = std::move(items);
     SortIntoTiles(m_order, [&](uint32_t item) -> const Tavo_GrWRect& { return bounds[item]; }, kFanout);
 
     std::vector<Node> leaves;

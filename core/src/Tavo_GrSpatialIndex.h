@@ -15,13 +15,15 @@ class Tavo_GrSpatialIndex {
 public:
     static constexpr int kFanout = 16;
 
+    // Indexes every item, or only the given item numbers (into bounds).
     void Build(const std::vector<Tavo_GrWRect>& bounds);
+    void Build(const std::vector<Tavo_GrWRect>& bounds, std::vector<uint32_t> items);
     void Clear();
     bool IsBuilt() const { return m_built; }
 
-    // Appends to hits the number of every item whose bounds (the same vector
-    // the index was built from) meet area, touching counts; in no particular
-    // order.
+    // Appends to hits the number of every indexed item whose bounds (the same
+    // vector the index was built from) meet area, touching counts; in no
+    // particular order.
     void Query(const Tavo_GrWRect& area, const std::vector<Tavo_GrWRect>& bounds, std::vector<uint32_t>& hits) const;
 
 private:

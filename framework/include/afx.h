@@ -146,10 +146,10 @@ public:
         cx -= size.cx;
         cy -= size.cy;
     }
-    void SetSize(int CX, int CY) noexcept
+    void SetSize(int width, int height) noexcept
     {
-        cx = CX;
-        cy = CY;
+        cx = width;
+        cy = height;
     }
 
     CSize operator+(SIZE size) const noexcept { return CSize(cx + size.cx, cy + size.cy); }

@@ -111,7 +111,7 @@ protected: \
         static const AFX_MSGMAP_ENTRY _messageEntries[] = {
 
 #define END_MESSAGE_MAP() \
-            {0, 0, 0, 0, AfxSig_end, (AFX_PMSG)0} \
+            {0, 0, 0, 0, AfxSig_end, static_cast<AFX_PMSG>(nullptr)} \
         }; \
         static const AFX_MSGMAP messageMap = {&TheBaseClass::GetThisMessageMap, &_messageEntries[0]}; \
         return &messageMap; \
@@ -119,7 +119,7 @@ protected: \
     PTM_WARNING_RESTORE
 
 #define AFX_WM_ENTRY(msg, sig, type, memberFxn) \
-    {msg, 0, 0, 0, sig, (AFX_PMSG)(AFX_PMSGW)(static_cast<type>(memberFxn))},
+    {msg, 0, 0, 0, sig, static_cast<AFX_PMSG>(reinterpret_cast<AFX_PMSGW>(static_cast<type>(memberFxn)))},
 
 // LRESULT memberFxn(WPARAM, LPARAM)
 #define ON_MESSAGE(message, memberFxn) \
@@ -127,8 +127,8 @@ protected: \
 // nMessageVariable: a UINT holding a RegisterWindowMessage id; read when a
 // message arrives, so it may be filled after the map is built.
 #define ON_REGISTERED_MESSAGE(nMessageVariable, memberFxn) \
-    {AFX_REGISTERED_MESSAGE_CODE, 0, 0, 0, (UINT_PTR)(UINT*)(&nMessageVariable), \
-      (AFX_PMSG)(AFX_PMSGW)(static_cast<LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM)>(memberFxn))},
+    {AFX_REGISTERED_MESSAGE_CODE, 0, 0, 0, reinterpret_cast<UINT_PTR>(static_cast<UINT*>(&nMessageVariable)), \
+      static_cast<AFX_PMSG>(reinterpret_cast<AFX_PMSGW>(static_cast<LRESULT (AFX_MSG_CALL CWnd::*)(WPARAM, LPARAM)>(memberFxn)))},
 
 #define ON_WM_CREATE() AFX_WM_ENTRY(WM_CREATE, AfxSig_is, int (AFX_MSG_CALL CWnd::*)(LPCREATESTRUCT), &ThisClass::OnCreate)
 #define ON_WM_DESTROY() AFX_WM_ENTRY(WM_DESTROY, AfxSig_vv, void (AFX_MSG_CALL CWnd::*)(void), &ThisClass::OnDestroy)
@@ -239,7 +239,7 @@ public:
     operator HPEN() const
     {
         const auto* self = AfxNullableThis(this);
-        return (HPEN)(self == NULL ? NULL : self->m_hObject);
+        return static_cast<HPEN>(self == NULL ? NULL : self->m_hObject);
     }
     int GetLogPen(LOGPEN* pLogPen) const;
 };
@@ -258,7 +258,7 @@ public:
     operator HBRUSH() const
     {
         const auto* self = AfxNullableThis(this);
-        return (HBRUSH)(self == NULL ? NULL : self->m_hObject);
+        return static_cast<HBRUSH>(self == NULL ? NULL : self->m_hObject);
     }
     int GetLogBrush(LOGBRUSH* pLogBrush) const;
 };
@@ -275,7 +275,7 @@ public:
     operator HFONT() const
     {
         const auto* self = AfxNullableThis(this);
-        return (HFONT)(self == NULL ? NULL : self->m_hObject);
+        return static_cast<HFONT>(self == NULL ? NULL : self->m_hObject);
     }
     int GetLogFont(LOGFONT* pLogFont);
 };
@@ -288,7 +288,7 @@ public:
     operator HRGN() const
     {
         const auto* self = AfxNullableThis(this);
-        return (HRGN)(self == NULL ? NULL : self->m_hObject);
+        return static_cast<HRGN>(self == NULL ? NULL : self->m_hObject);
     }
     BOOL CreateRectRgn(int x1, int y1, int x2, int y2);
     BOOL CreateRectRgnIndirect(LPCRECT lpRect);
@@ -741,6 +741,10 @@ public:
     BOOL SetScrollInfo(LPSCROLLINFO lpScrollInfo, BOOL bRedraw = TRUE);
     BOOL GetScrollInfo(LPSCROLLINFO lpScrollInfo, UINT nMask = SIF_ALL);
     int GetScrollLimit();
+
+private:
+    // The window's own Create replaces the general one, which stays out of reach.
+    using CWnd::Create;
 };
 
 class AFX_FRAMEWORK_CLASS CButton : public CWnd
@@ -756,6 +760,10 @@ public:
     void SetCheck(int nCheck);
     UINT GetButtonStyle() const;
     void SetButtonStyle(UINT nStyle, BOOL bRedraw = TRUE);
+
+private:
+    // The window's own Create replaces the general one, which stays out of reach.
+    using CWnd::Create;
 };
 
 // The base of dialog classes. Dialogs here are shown by the common dialogs

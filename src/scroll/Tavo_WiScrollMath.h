@@ -9,12 +9,13 @@
 #pragma once
 
 #include "Tavo_GrRound.h"
+#include "Tavo_WiScroll.h"
 
 #include <climits>
 
 namespace Tavo_WiScrollMath {
 
-constexpr int MaxBarRange = 32767;
+using Tavo_WiScroll::MaxBarRange;
 
 // The width given to a requested range that is empty or reversed.
 constexpr int DefaultRangeWidth = 100;

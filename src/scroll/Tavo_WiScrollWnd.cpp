@@ -304,118 +304,87 @@ void Tavo_WiScrollWnd::EndScrollAction()
         OnNonDragScrollEnd(m_position);
 }
 
-void Tavo_WiScrollWnd::ScrollToX(int x)
+void Tavo_WiScrollWnd::ScrollTo(Axis axis, int value)
 {
-    if (x == m_position.x)
+    const bool horizontal = axis == Axis::Horizontal;
+    if (value == (horizontal ? m_position.x : m_position.y))
         return;
-    ScrollWindowTo(CPoint(x, m_position.y));
-    if (m_dragScrolling)
-        OnDragScrollMove(m_position);
-}
-
-void Tavo_WiScrollWnd::ScrollToY(int y)
-{
-    if (y == m_position.y)
-        return;
-    ScrollWindowTo(CPoint(m_position.x, y));
+    ScrollWindowTo(horizontal ? CPoint(value, m_position.y) : CPoint(m_position.x, value));
     if (m_dragScrolling)
         OnDragScrollMove(m_position);
 }
 
 void Tavo_WiScrollWnd::OnHScroll(UINT code, UINT n, CScrollBar* bar)
 {
-    const long long x = m_position.x;
-    long long target = x;
-    switch (code) {
-    case SB_LINELEFT:
-        target = x - m_lineDelta.cx;
-        break;
-    case SB_LINERIGHT:
-        target = x + m_lineDelta.cx;
-        break;
-    case SB_PAGELEFT:
-        target = x - m_pageDelta.cx;
-        break;
-    case SB_PAGERIGHT:
-        target = x + m_pageDelta.cx;
-        break;
-    case SB_THUMBPOSITION:
-    case SB_THUMBTRACK: {
-        BeginThumbDrag();
-        const double barOffset =
-            static_cast<double>(ThumbPosition(n, bar)) - ToBarUnits(m_rangeMin.x, m_horzScale);
-        target = static_cast<long long>(m_rangeMin.x) + Tavo_GrTruncate(barOffset * m_horzScale);
-        break;
-    }
-    case SB_LEFT:
-        target = m_rangeMin.x;
-        break;
-    case SB_RIGHT:
-        target = m_rangeMax.x;   // the clamp brings it back by the extent
-        break;
-    case SB_ENDSCROLL:
-        EndScrollAction();
-        return;
-    case PercentBack:
-        target = x - TruncatedPercentOf(m_windowExtent.cx, n);
-        break;
-    case PercentForward:
-        target = x + TruncatedPercentOf(m_windowExtent.cx, n);
-        break;
-    default:
-        return;
-    }
-    ScrollToX(Tavo_GrSaturate(target));
+    OnScroll(Axis::Horizontal, code, n, bar);
 }
 
 void Tavo_WiScrollWnd::OnVScroll(UINT code, UINT n, CScrollBar* bar)
 {
-    // Backwards (up the bar) is towards smaller y normally and towards larger
-    // y in inverted-Y mode.
-    const int sign = m_invertedY ? -1 : 1;
-    const long long y = m_position.y;
-    long long target = y;
+    OnScroll(Axis::Vertical, code, n, bar);
+}
+
+// The horizontal and vertical scroll codes share their values (SB_LINELEFT is
+// SB_LINEUP, SB_LEFT is SB_TOP, ...), so one routine serves both bars.
+void Tavo_WiScrollWnd::OnScroll(Axis axis, UINT code, UINT n, CScrollBar* bar)
+{
+    const bool horizontal = axis == Axis::Horizontal;
+    // Backwards (left, up the bar) is towards smaller values, except on the
+    // vertical axis in inverted-Y mode, where the top of the range is its
+    // maximum.
+    const bool flipped = !horizontal && m_invertedY;
+    const int sign = flipped ? -1 : 1;
+    const long long position = horizontal ? m_position.x : m_position.y;
+    const long long lineDelta = horizontal ? m_lineDelta.cx : m_lineDelta.cy;
+    const long long pageDelta = horizontal ? m_pageDelta.cx : m_pageDelta.cy;
+    const int rangeMin = horizontal ? m_rangeMin.x : m_rangeMin.y;
+    const int rangeMax = horizontal ? m_rangeMax.x : m_rangeMax.y;
+    const int extent = horizontal ? m_windowExtent.cx : m_windowExtent.cy;
+    const double scale = horizontal ? m_horzScale : m_vertScale;
+
+    long long target = position;
     switch (code) {
     case SB_LINEUP:
-        target = y - static_cast<long long>(sign) * m_lineDelta.cy;
+        target = position - sign * lineDelta;
         break;
     case SB_LINEDOWN:
-        target = y + static_cast<long long>(sign) * m_lineDelta.cy;
+        target = position + sign * lineDelta;
         break;
     case SB_PAGEUP:
-        target = y - static_cast<long long>(sign) * m_pageDelta.cy;
+        target = position - sign * pageDelta;
         break;
     case SB_PAGEDOWN:
-        target = y + static_cast<long long>(sign) * m_pageDelta.cy;
+        target = position + sign * pageDelta;
         break;
     case SB_THUMBPOSITION:
     case SB_THUMBTRACK: {
         BeginThumbDrag();
-        const double barOffset =
-            static_cast<double>(ThumbPosition(n, bar)) - ToBarUnits(m_rangeMin.y, m_vertScale);
-        const long long offset = Tavo_GrTruncate(barOffset * m_vertScale);
-        target = m_invertedY ? m_rangeMax.y - offset : m_rangeMin.y + offset;
+        const double barOffset = static_cast<double>(ThumbPosition(n, bar)) - ToBarUnits(rangeMin, scale);
+        const long long offset = Tavo_GrTruncate(barOffset * scale);
+        target = flipped ? rangeMax - offset : rangeMin + offset;
         break;
     }
     case SB_TOP:
-        target = m_invertedY ? m_rangeMax.y : m_rangeMin.y;
+        target = flipped ? rangeMax : rangeMin;
         break;
     case SB_BOTTOM:
-        target = m_invertedY ? m_rangeMin.y : m_rangeMax.y;
+        target = flipped ? rangeMin : rangeMax;   // the clamp brings it back by the extent
         break;
     case SB_ENDSCROLL:
         EndScrollAction();
         return;
+    // A percentage step is truncated horizontally and rounded to the nearest
+    // unit vertically.
     case PercentBack:
-        target = y - RoundedPercentOf(m_windowExtent.cy, n, sign);
+        target = position - (horizontal ? TruncatedPercentOf(extent, n) : RoundedPercentOf(extent, n, sign));
         break;
     case PercentForward:
-        target = y + RoundedPercentOf(m_windowExtent.cy, n, sign);
+        target = position + (horizontal ? TruncatedPercentOf(extent, n) : RoundedPercentOf(extent, n, sign));
         break;
     default:
         return;
     }
-    ScrollToY(Tavo_GrSaturate(target));
+    ScrollTo(axis, Tavo_GrSaturate(target));
 }
 
 // ---- layout -------------------------------------------------------------------

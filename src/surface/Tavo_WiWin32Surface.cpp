@@ -71,6 +71,8 @@ Tavo_WiWin32Surface::Tavo_WiWin32Surface()
         const int value = UT_STR::AToI(text);
         m_minFont = value > static_cast<int>(kSmallestFontPixels) ? value : static_cast<int>(kSmallestFontPixels);
     }
+    // Smaller text is drawn at the minimum font: the core culls text by that height.
+    SetMinTextPixels(m_minFont);
 
     ++m_instanceCount;
     if (!m_2array) {

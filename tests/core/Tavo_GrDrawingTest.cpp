@@ -11,6 +11,8 @@
 #include <gtest/gtest.h>
 
 #include <memory>
+#include <string>
+#include <vector>
 
 namespace {
 
@@ -221,6 +223,100 @@ TEST_F(DrawingTest, AClipThatMeetsMostItemsDrawsThemInOrderPassAfterPass)
     EXPECT_EQ(DotsDrawn(m_surface).size(), 91u) << "an item added after a pass is found";
 }
 
+// ---- Culling of text ----------------------------------------------------------------
+
+// What the pass visited: "Dot", "Rect", "Line", or the text of a text item.
+std::vector<std::string> Visited(const RecordingSurface& surface)
+{
+    std::vector<std::string> visited;
+    for (const RecordingSurface::Call& call : surface.m_calls) {
+        if (call.op == "Text" || call.op == "TextBox")
+            visited.push_back(call.text);
+        else if (call.op == "Dot" || call.op == "Rect" || call.op == "Line")
+            visited.push_back(call.op);
+    }
+    return visited;
+}
+
+TEST_F(DrawingTest, TextIsFoundWhereTheSurfaceDrawsItOtherItemsByTheirBounds)
+{
+    // A clip of x and y 400 ... 499 at one pixel per unit: with the margin,
+    // world 396 ... 503. The texts are 5 units high, drawn 8 pixels high by a
+    // surface whose smallest text is 8 pixels.
+    constexpr int kHeight = 5;
+    constexpr char kLeft = Tavo_GrAttr::AlignLeft | Tavo_GrAttr::AlignBottom;
+    constexpr char kRight = Tavo_GrAttr::AlignRight | Tavo_GrAttr::AlignBottom;
+    constexpr char kCentre = Tavo_GrAttr::AlignCentre | Tavo_GrAttr::AlignBottom;
+    Tavo_GrDrawing symbol;
+    Tavo_GrDrawingBuilder symbolBuild(symbol);
+    symbolBuild.SetAttr(Tavo_GrAttr(0, 0, kHeight, kLeft));
+    symbolBuild.AddText(0, 0, "called 1234");
+
+    const struct {
+        const char* text; // or the item's kind
+        bool withoutFloor;
+        bool withFloor;
+        void (*add)(Tavo_GrDrawingBuilder& build, const Tavo_GrDrawing& symbol);
+    } items[] = {
+        // 11 characters: 55 units nominally, 88 at the floor.
+        {"left 789012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(340, 450, "left 789012"); }},
+        {"right 89012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddText(560, 450, "right 89012"); }},
+        {"centre 9012", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kCentre}); b.AddText(540, 450, "centre 9012"); }},
+        {"far 5678901", false, false,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(300, 450, "far 5678901"); }},
+        // Above the clip: 1.5 character heights below the baseline reach it only at the floor.
+        {"above", false, true, [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddText(420, 513, "above"); }},
+        // Tall text below the clip: its cell may stand half a height above its nominal bounds.
+        {"tall", true, true, [](auto& b, auto&) { b.SetAttr({0, 0, 20, kLeft}); b.AddText(420, 370, "tall"); }},
+        // Right-aligned lines of a box are drawn left of it.
+        {"box right", true, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kRight}); b.AddTextBox({510, 440, 560, 460}, "box right"); }},
+        {"box left", false, false,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({510, 440, 560, 460}, "box left"); }},
+        // Cut text of a box above the clip: two lines below the box.
+        {"box near", true, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 508, 480, 530}, "box near"); }},
+        {"box above", false, true,
+         [](auto& b, auto&) { b.SetAttr({0, 0, kHeight, kLeft}); b.AddTextBox({420, 515, 480, 530}, "box above"); }},
+        {"called 1234", false, true, [](auto& b, auto& s) { b.AddCall(&s, 340, 450); }},
+        // Other items just beyond the margin stay out; the one inside is in.
+        {"Dot", false, false, [](auto& b, auto&) { b.AddDot(504, 450); }},
+        {"Rect", false, false, [](auto& b, auto&) { b.AddRect(380, 504, 520, 520); }},
+        {"Line", false, false, [](auto& b, auto&) { b.AddLine(300, 395, 600, 395); }},
+        {"Dot", true, true, [](auto& b, auto&) { b.AddDot(450, 450); }},
+    };
+    std::vector<std::string> withoutFloor;
+    std::vector<std::string> withFloor;
+    for (const auto& item : items) {
+        item.add(m_build, symbol);
+        if (item.withoutFloor)
+            withoutFloor.push_back(item.text);
+        if (item.withFloor)
+            withFloor.push_back(item.text);
+    }
+
+    const Tavo_GrDRect clip{400, 400, 499, 499};
+    DrawAtUnitScale(&clip);
+    EXPECT_EQ(Visited(m_surface), withoutFloor) << "without a smallest text height";
+    RecordingSurface floored;
+    floored.SetMinTextPixels(8);
+    m_drawing.Draw(floored, UnitMapping(m_drawing), &clip);
+    EXPECT_EQ(Visited(floored), withFloor) << "text drawn at least 8 pixels high";
+
+    // Zoomed in fourfold the 5-unit texts are 20 pixels high: the floor adds nothing.
+    RecordingSurface zoomed;
+    zoomed.SetMinTextPixels(8);
+    Tavo_GrMapping mapping(&m_drawing, 5);
+    mapping.SetDeviceWindowSize(1000, 1000, true, nullptr);
+    mapping.SetWorldClipBox({0, 0, 250, 250});
+    const Tavo_GrDRect zoomedClip{1600, 1600, 1996, 1996}; // world 399 ... 500 with the margin
+    m_drawing.Draw(zoomed, mapping, &zoomedClip);
+    EXPECT_EQ(Visited(zoomed), withoutFloor);
+}
+
 // ---- Memory ---------------------------------------------------------------------
 
 TEST_F(DrawingTest, PassesAfterTheFirstAllocateNothingInTheCoreWhateverTheyVisit)
@@ -238,6 +334,7 @@ TEST_F(DrawingTest, PassesAfterTheFirstAllocateNothingInTheCoreWhateverTheyVisit
         m_build.AddCall(&symbol, x, y);
     }
     const Tavo_GrMapping mapping = UnitMapping(m_drawing);
+    m_surface.SetMinTextPixels(16); // the texts are looked for as if twice as high
     const Tavo_GrDRect most{0, 0, 900, 1000};
     const Tavo_GrDRect small{100, 100, 200, 200};
     HeapCallCounter counter("libTavo_Core.dll");
