@@ -1,10 +1,14 @@
-// render: draws the built-in sample drawing through the GDI rendering surface
-// into a 32-bit DIB section and writes it as a PNG.
+// render: draws the built-in sample drawing, or a DXF drawing, through the GDI
+// rendering surface into a 32-bit DIB section and writes it as a PNG, or prints
+// the sample drawing's page grid on the default printer.
 #include "DibCanvas.h"
 #include "PngWriter.h"
 #include "RenderOptions.h"
 #include "SampleDrawing.h"
+#include "SamplePrintJob.h"
 
+#include "Tavo_DxfImport.h"
+#include "Tavo_DxfPaletteColours.h"
 #include "Tavo_GrDrawing.h"
 #include "Tavo_GrMapping.h"
 #include "Tavo_WiLibrary.h"
@@ -30,10 +34,30 @@ void PrintStats(const Tavo_GrSurfaceStats& stats)
             std::printf("  %-18s %u\n", kCounterNames[i], static_cast<unsigned>(stats.m_counters[i]));
 }
 
+// Imports the DXF file into the drawing and says how it went; false when the
+// file was refused.
+bool ImportDxf(const std::string& path, Tavo_GrDrawing& drawing)
+{
+    Tavo_DxfPaletteColours colours(*Tavo_WiLibrary::GetPalette());
+    const Tavo_DxfImportResult result = Tavo_DxfImportFile(path.c_str(), drawing, colours);
+    for (const Tavo_DxfMessage& warning : result.warnings)
+        std::printf("render: %s: warning: %s\n", path.c_str(), warning.text.c_str());
+    if (!result.ok) {
+        std::fprintf(stderr, "render: %s: line %d: %s\n", path.c_str(), result.error.line, result.error.text.c_str());
+        return false;
+    }
+    std::printf("render: %s: %lld items on %d layers, %g world units per drawing unit\n", path.c_str(),
+                result.itemsMade, result.layersMade, result.scale);
+    return true;
+}
+
 int Render(const RenderOptions& options)
 {
     Tavo_GrDrawing drawing;
-    BuildSampleDrawing(drawing);
+    if (options.dxf.empty())
+        BuildSampleDrawing(drawing);
+    else if (!ImportDxf(options.dxf, drawing))
+        return 1;
 
     Tavo_GrMapping mapping(&drawing, kLevelsPerDoubling);
     mapping.SetDeviceWindowSize(options.width, options.height, true, nullptr);
@@ -68,6 +92,23 @@ int Render(const RenderOptions& options)
     return 0;
 }
 
+int Print(const RenderOptions& options)
+{
+    Tavo_GrDrawing drawing;
+    BuildSampleDrawing(drawing);
+    SamplePrintResult result;
+    const std::string failure =
+        PrintSampleGrid(drawing, options.width, options.height, options.zoom, options.print, result);
+    if (!failure.empty()) {
+        std::fprintf(stderr, "render: printing to %s: %s\n", options.print.c_str(), failure.c_str());
+        return 1;
+    }
+    std::printf("render: printed %d pages (%d columns x %d rows, current page %d, zoom level %d) to %s\n",
+                result.pagesPrinted, result.columns, result.rows, result.currentPage, options.zoom,
+                options.print.c_str());
+    return 0;
+}
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -83,7 +124,7 @@ int main(int argc, char** argv)
         return 0;
     }
     Tavo_WiLibrary::Initialize();
-    const int status = Render(options);
+    const int status = options.print.empty() ? Render(options) : Print(options);
     Tavo_WiLibrary::Terminate(false);
     return status;
 }

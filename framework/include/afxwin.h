@@ -33,6 +33,7 @@ class CRgn;
 class CScrollBar;
 class CWinThread;
 class CWinApp;
+class CPrintDialog;  // <afxdlgs.h>
 struct CCreateContext;  // document/view creation context; passed through, never read
 
 // ---------------------------------------------------------------------------
@@ -851,6 +852,12 @@ public:
     // Makes a DC for the application's default printer and attaches it to dc.
     BOOL CreatePrinterDC(CDC& dc);
     void UpdatePrinterSelection(BOOL bForceDefaults);
+    // Shows a print dialog on the application's printer defaults and keeps
+    // the printer and settings the user chose as the new defaults (the
+    // application still owns them; the printer DC in pPD->m_pd.hDC is the
+    // caller's). Defaults that name a printer that is gone are dropped and
+    // the dialog is shown once more on fresh ones. IDOK or IDCANCEL.
+    virtual int DoPrintDialog(CPrintDialog* pPD);
 
     HCURSOR LoadCursor(LPCTSTR lpszResourceName) const;
     HCURSOR LoadCursor(UINT nIDResource) const;

@@ -67,6 +67,32 @@ BOOL CWinApp::GetPrinterDeviceDefaults(PRINTDLG* pPrintDlg)
     return TRUE;
 }
 
+int CWinApp::DoPrintDialog(CPrintDialog* pPD)
+{
+    if (pPD == NULL)
+        return IDCANCEL;
+    UpdatePrinterSelection(FALSE);
+    pPD->m_pd.hDevMode = m_hDevMode;
+    pPD->m_pd.hDevNames = m_hDevNames;
+    INT_PTR response = pPD->DoModal();
+    if (response != IDOK) {
+        // Defaults that name a printer that is gone or changed: take fresh
+        // ones and ask again, once.
+        const DWORD error = ::CommDlgExtendedError();
+        if (error == PDERR_PRINTERNOTFOUND || error == PDERR_DNDMMISMATCH || error == PDERR_DEFAULTDIFFERENT) {
+            UpdatePrinterSelection(TRUE);
+            pPD->m_pd.hDevMode = m_hDevMode;
+            pPD->m_pd.hDevNames = m_hDevNames;
+            response = pPD->DoModal();
+        }
+    }
+    // PrintDlg may have reallocated the handles or replaced them with those
+    // of another printer; they are the application's defaults from now on.
+    m_hDevMode = pPD->m_pd.hDevMode;
+    m_hDevNames = pPD->m_pd.hDevNames;
+    return static_cast<int>(response);
+}
+
 BOOL CWinApp::CreatePrinterDC(CDC& dc)
 {
     CPrintDialog printer(FALSE);

@@ -12,6 +12,7 @@ TAVO_PACKAGES=(
     wine wine64
     xvfb
     ghostscript
+    librecad-data
 )
 
 tavo_step() { printf '\n==> %s\n' "$*"; }

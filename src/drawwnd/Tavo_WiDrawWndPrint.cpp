@@ -148,6 +148,10 @@ void Tavo_WiDrawWnd::OnPrint(CDC* dc, CPrintInfo* info)
     Tavo_WiWin32Surface* surface = GetPrintSurface();
     if (!surface)
         return;
+    // Binding sets the device context's text alignment and background mode
+    // for the surface's pass; the next page's header is drawn with the
+    // host's settings again, so they are given back afterwards.
+    const int savedDC = dc->SaveDC();
     surface->SetDC(dc->m_hDC);
     const bool savedBlackAndWhite = surface->IsBlackAndWhite();
     const int savedThicken = surface->GetThickenVertLine();
@@ -163,4 +167,5 @@ void Tavo_WiDrawWnd::OnPrint(CDC* dc, CPrintInfo* info)
 
     surface->SetBlackAndWhiteFlag(savedBlackAndWhite);
     surface->SetThickenVertLine(savedThicken);
+    dc->RestoreDC(savedDC);
 }

@@ -42,6 +42,7 @@ BOOL Tavo_WiPrintDialog::OnInitDialog()
         haveReference = true;
     }
 
+    // A dialog made without a window's layout labels the one-page layout.
     const int columns = m_layout ? m_layout->m_numCols : 1;
     const int rows = m_layout ? m_layout->m_numRows : 1;
     const int current = m_layout ? m_layout->m_currentPage : 1;

@@ -105,10 +105,11 @@ inline int DialogPageCount(const Tavo_WiPrintLayout& layout)
     return static_cast<int>(std::clamp(pages, 0LL, static_cast<long long>(MaxDialogPage)));
 }
 
-// Whether page is a page of the grid (numbered from 1).
+// Whether page is a page of the grid (numbered from 1) that the layout's
+// m_page can name.
 inline bool IsPageOfGrid(const Tavo_WiPrintLayout& layout, long long page)
 {
-    return page >= 1 && page <= static_cast<long long>(layout.m_numCols) * layout.m_numRows;
+    return page >= 1 && page <= INT_MAX && page <= static_cast<long long>(layout.m_numCols) * layout.m_numRows;
 }
 
 // The world box of page (numbered from 1): column (page - 1) mod columns,

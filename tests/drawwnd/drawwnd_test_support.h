@@ -33,6 +33,7 @@ public:
 
     Tavo_WiNativeWindowSurface surface;
     bool useSurface = true;
+    Tavo_WiWin32Surface* printSurface = nullptr;    // handed out by GetPrintSurface; not owned
     std::vector<Note> notes;
     DragAction dragAction = Pan;
     CString dataTipText;
@@ -40,6 +41,7 @@ public:
     std::function<void()> onPaint;  // run at each of those passes, before the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
+    Tavo_WiWin32Surface* GetPrintSurface() override { return printSurface; }
 
     // The protected and private parts the tests drive directly.
     using Tavo_WiDrawWnd::GetScrollDeviceDeltas;

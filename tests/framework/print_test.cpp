@@ -138,3 +138,23 @@ TEST_F(PrintTest, ApplicationKeepsOnePrinterDefaultAndPrinterDcsComeFromIt)
     ASSERT_TRUE(app.CreatePrinterDC(appPrinter));
     EXPECT_EQ(DT_RASPRINTER, appPrinter.GetDeviceCaps(TECHNOLOGY));
 }
+
+TEST_F(PrintTest, ApplicationShowsTheDialogOnItsDefaultsAndKeepsWhatWasChosen)
+{
+    CWinApp app;
+    CInspectingPrintDialog dialog(IDOK);
+    dialog.m_pd.nMinPage = 1;
+    dialog.m_pd.nMaxPage = 30;
+    ASSERT_EQ(IDOK, app.DoPrintDialog(&dialog));
+    EXPECT_EQ(1, dialog.m_initCount);
+    ASSERT_NE(nullptr, app.m_hDevNames);
+    EXPECT_EQ(app.m_hDevNames, dialog.m_pd.hDevNames);
+    EXPECT_EQ(app.m_hDevMode, dialog.m_pd.hDevMode);
+    PRINTDLG lent = {};
+    ASSERT_TRUE(app.GetPrinterDeviceDefaults(&lent));
+    EXPECT_EQ(dialog.m_pd.hDevNames, lent.hDevNames);
+    // The printer DC is the caller's; the printer handles stay the application's.
+    EXPECT_NE(nullptr, dialog.GetPrinterDC());
+    ::DeleteDC(dialog.m_pd.hDC);
+    EXPECT_EQ(IDCANCEL, app.DoPrintDialog(NULL));
+}
