@@ -1,5 +1,6 @@
 // Tavo_WiWin32Surface: construction, binding to a device context, the mapping
-// of attributes to GDI objects, the end of a pass and the Escape interrupt.
+// of attributes to GDI objects, the start and end of a pass and the Escape
+// interrupt.
 // Batching is in Tavo_WiWin32SurfaceBatching.cpp, the drawing operations in
 // Tavo_WiWin32SurfaceDrawing.cpp, text in Tavo_WiWin32SurfaceText.cpp.
 #include "Tavo_WiWin32Surface.h"
@@ -240,10 +241,26 @@ void Tavo_WiWin32Surface::ForgetGdiObjects()
     m_oldFont = nullptr;
 }
 
+void Tavo_WiWin32Surface::BeginDrawing(const Tavo_GrDrawing* drawing)
+{
+    Tavo_GrSurface::BeginDrawing(drawing);
+    // A pass that starts with Escape held stops at its first poll, however
+    // recently the previous pass asked.
+    m_escapeQueryTick = kNoEscapeQuery;
+}
+
 bool Tavo_WiWin32Surface::PollDrawInterrupt()
 {
     if (IsDrawingInterrupted())
         return true;
+    // Asking the key state is a kernel call on Windows and a round trip to the
+    // server under Wine on a thread that owns a window: asked at every batch
+    // boundary, nine times per flush, it would cost a third of a paint. Once
+    // per clock tick (about 16 ms) is quicker than a person can tell.
+    const ULONGLONG now = GetTickCount64();
+    if (now == m_escapeQueryTick)
+        return false;
+    m_escapeQueryTick = now;
     // The sign bit says the key is down now.
     if (GetAsyncKeyState(VK_ESCAPE) & 0x8000) {
         SetDrawingInterruptedFlag();
