@@ -93,6 +93,13 @@ struct BusyDrawing
                     build.AddText(x, y, n % 2 ? "Mgjy" : "W|q");
             }
         }
+        // Words below the smallest font, drawn at it, so more than twice as
+        // long as their own bounds, and closer together than that: some of
+        // them straddle every strip's edge.
+        build.SetAttr(Tavo_GrAttr(White, 0, 6));
+        for (int x = 3; x < 1000; x += 70)
+            for (int y = 5; y < 800; y += 37)
+                build.AddText(x, y, "WWWWWW");
     }
 
     Tavo_GrDrawing drawing;
