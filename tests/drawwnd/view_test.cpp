@@ -176,9 +176,10 @@ TEST(ViewMath, ScrollRangeHasMarginsOnlyWhenZoomedIn)
 
 TEST(ViewMath, DeltasRoundAwayFromZeroAndNeverLeaveAnUnboundedError)
 {
+    // The ordinary cases are checked through the window; here the extremes.
     const double inf = std::numeric_limits<double>::infinity();
     const struct { long long world; double scale; int pixels; double error; } toDevice[] = {
-        {3, 1.5, 5, 0.5}, {-3, 1.5, -5, -0.5}, {2, 1.5, 3, 0.0}, {1, 0.3, 0, -0.3}, {0, inf, 0, 0.0},
+        {-3, 1.5, -5, -0.5}, {1, 0.3, 0, -0.3}, {0, inf, 0, 0.0}, {5, 0.0, 0, 0.0},
         // Beyond int range the whole view is uncovered: nothing to line up with.
         {10000, 1e6, INT_MAX, 0.0}, {-2, inf, INT_MIN, 0.0}};
     for (const auto& c : toDevice) {
@@ -187,8 +188,7 @@ TEST(ViewMath, DeltasRoundAwayFromZeroAndNeverLeaveAnUnboundedError)
         EXPECT_DOUBLE_EQ(d.error, c.error) << c.world << " at " << c.scale;
     }
     const struct { int device; double scale; int world; } toWorld[] = {
-        {1, 10.0, 1}, {5, 10.0, 1}, {14, 10.0, 1}, {25, 10.0, 3}, {-1, 10.0, -1}, {-15, 10.0, -2},
-        {0, 10.0, 0}, {7, 0.5, 14}, {3, 0.0, 0}, {INT_MAX, 1e-3, INT_MAX}};
+        {7, 0.5, 14}, {-15, 10.0, -2}, {3, 0.0, 0}, {INT_MAX, 1e-3, INT_MAX}, {INT_MIN, 1e-3, -INT_MAX}};
     for (const auto& c : toWorld)
         EXPECT_EQ(Tavo_WiViewMath::ToWorldStep(c.device, c.scale), c.world) << c.device << " at " << c.scale;
 }
@@ -729,7 +729,7 @@ TEST_F(DrawWndViewTest, ZeroSizedOrMinimisedWindowLeavesTheViewAlone)
     popup.DestroyWindow();
 }
 
-TEST_F(DrawWndViewTest, EmptyOrHugeDrawingGivesAFiniteViewAtEveryLevel)
+TEST_F(DrawWndViewTest, EmptyOrHugeDrawingKeepsASoundViewAtEveryLevel)
 {
     Tavo_GrDrawing empty;
     Tavo_GrDrawing huge;
@@ -740,16 +740,17 @@ TEST_F(DrawWndViewTest, EmptyOrHugeDrawingGivesAFiniteViewAtEveryLevel)
         PaintNow(Scrollee());
         for (int level : {0, 1, 50, 200, 400}) {
             Zoom(Tavo_GrZoom::ToLevel, level);
-            const double scale = Scale();
-            EXPECT_TRUE(std::isfinite(scale) || level > 100) << level;
+            EXPECT_TRUE(std::isfinite(Scale()) && Scale() > 0.0) << level;
             const Tavo_GrWRect shown = Wnd().GetWorldClipBox();
             EXPECT_LE(shown.x1, shown.x2);
             EXPECT_LE(shown.y1, shown.y2);
+            // A unit is far more pixels than an int holds: the moved pixels
+            // leave no error term behind that would push later drawing away.
             Wnd().ScrollWindowByDeviceDeltas(7, -7);
             Wnd().ScrollWindow(Right, Tavo_WiScroll::Page, 0);
             PaintNow(Scrollee());
-            EXPECT_TRUE(std::isfinite(Wnd().GetMapping()->GetXErrorTerm())) << level;
-            EXPECT_TRUE(std::isfinite(Wnd().GetMapping()->GetYErrorTerm())) << level;
+            EXPECT_LE(std::fabs(Wnd().GetMapping()->GetXErrorTerm()), 1.0) << level;
+            EXPECT_LE(std::fabs(Wnd().GetMapping()->GetYErrorTerm()), 1.0) << level;
         }
     }
 }
