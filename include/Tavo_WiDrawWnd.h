@@ -136,7 +136,8 @@ public:
     // ---- binding and access -------------------------------------------------------
     // Binds a drawing (not owned) and shows it at the zero level, or unbinds
     // with null. The mapping gets the largest zoom level, the zero-level
-    // expansion (percent) and the largest-zoom world clip box size.
+    // expansion (percent) and the largest-zoom world clip box size. The view
+    // to undo goes with the old mapping.
     void SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, int surfaceOption,
                         int zeroLevelExpansion, unsigned int maxClipWidth,
                         unsigned int maxClipHeight);
@@ -161,13 +162,15 @@ public:
     // ---- zooming and panning ------------------------------------------------------
     // Zooms by type and amount about the pointer, the view centre or the device
     // point (x, y). Without force, a zoom that would not change the level does
-    // nothing.
+    // nothing. No zoom form does anything while the window has no client area
+    // (minimised or zero-sized).
     void ZoomWindow(Tavo_GrZoom::Type type, int amount, Tavo_WiZoomCenter::Type centre, int x, int y,
                     bool force);
     // Zooms to a (fractional) zoom level about the world point (x, y).
     void ZoomWindow(double level, int x, int y);
-    // Zooms so that a world rectangle fills the view; nothing for a rectangle
-    // of zero width or height.
+    // Zooms so that a world rectangle fills the view (the view that is left
+    // once the zoom has shown or hidden the scroll bars); nothing for a
+    // rectangle of zero width or height.
     void ZoomWindow(const Tavo_GrWRect& rect);
     // Whether ZoomWindow(type, amount, ...) would change the zoom level.
     bool ZoomWindowTest(Tavo_GrZoom::Type type, int amount) const;
