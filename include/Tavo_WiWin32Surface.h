@@ -159,14 +159,19 @@ private:
     HGDIOBJ m_oldFont = nullptr;
 
     Tavo_GrSurfaceStats m_stats;
-    unsigned char m_textAlign = 5; // left, bottom: what SetDC selects
+    unsigned char m_textAlign = Tavo_GrAttr::AlignDefault; // left, bottom: what SetDC selects
     unsigned char m_color = kNoAttrCode;
     unsigned char m_fill = kNoAttrCode;
     // The clock tick of the last Escape query of this pass.
     ULONGLONG m_escapeQueryTick = kNoEscapeQuery;
 
-    // No dot added yet: no core position equals it in practice.
+    // The last-dot position before any dot was added: no core position
+    // equals it in practice.
     static constexpr int kNoDot = INT_MIN;
+    // The last-dot position once the dot batch has been emitted: one pixel
+    // beyond the device window's bottom-left corner, so a dot there (and only
+    // there) right after an emission counts as a repeat and is not drawn.
+    static constexpr int kNoDotSinceEmission = -1;
     // Smallest font height in pixels unless BRY_VWR_MINFONT says otherwise.
     static constexpr int kDefaultMinFont = 8;
     // Neither a colour nor a fill code: the first attribute change rebuilds all.

@@ -39,12 +39,12 @@ const unsigned int kSmallestFontPixels = 3;
 UINT ToGdiTextAlign(unsigned char code)
 {
     UINT flags = TA_LEFT;
-    switch (code & 3) {
-    case 2: flags = TA_RIGHT; break;
-    case 3: flags = TA_CENTER; break;
+    switch (code & Tavo_GrAttr::kHorizontalAlignMask) {
+    case Tavo_GrAttr::AlignRight: flags = TA_RIGHT; break;
+    case Tavo_GrAttr::AlignCentre: flags = TA_CENTER; break;
     default: break;
     }
-    return flags | ((code & 12) == 8 ? TA_TOP : TA_BOTTOM);
+    return flags | ((code & Tavo_GrAttr::kVerticalAlignMask) == Tavo_GrAttr::AlignTop ? TA_TOP : TA_BOTTOM);
 }
 
 LOGFONTA DescribeFont(unsigned int pixelHeight)
@@ -106,7 +106,7 @@ void Tavo_WiWin32Surface::SetDC(HDC dc)
     // otherwise be lost.
     ReleaseGdiObjects();
     m_hdc = dc;
-    m_textAlign = 5; // left, bottom
+    m_textAlign = Tavo_GrAttr::AlignDefault; // left, bottom
     SetTextAlign(dc, TA_LEFT | TA_BOTTOM);
     SetBkMode(dc, TRANSPARENT);
     SetPolyFillMode(dc, ALTERNATE);
