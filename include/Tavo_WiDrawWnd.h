@@ -136,7 +136,8 @@ public:
     // ---- binding and access -------------------------------------------------------
     // Binds a drawing (not owned) and shows it at the zero level, or unbinds
     // with null. The mapping gets the largest zoom level, the zero-level
-    // expansion (percent) and the largest-zoom world clip box size.
+    // expansion (percent) and the largest-zoom world clip box size. The view
+    // to undo goes with the old mapping.
     void SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, int surfaceOption,
                         int zeroLevelExpansion, unsigned int maxClipWidth,
                         unsigned int maxClipHeight);
@@ -161,13 +162,15 @@ public:
     // ---- zooming and panning ------------------------------------------------------
     // Zooms by type and amount about the pointer, the view centre or the device
     // point (x, y). Without force, a zoom that would not change the level does
-    // nothing.
+    // nothing. No zoom form does anything while the window has no client area
+    // (minimised or zero-sized).
     void ZoomWindow(Tavo_GrZoom::Type type, int amount, Tavo_WiZoomCenter::Type centre, int x, int y,
                     bool force);
     // Zooms to a (fractional) zoom level about the world point (x, y).
     void ZoomWindow(double level, int x, int y);
-    // Zooms so that a world rectangle fills the view; nothing for a rectangle
-    // of zero width or height.
+    // Zooms so that a world rectangle fills the view (the view that is left
+    // once the zoom has shown or hidden the scroll bars); nothing for a
+    // rectangle of zero width or height.
     void ZoomWindow(const Tavo_GrWRect& rect);
     // Whether ZoomWindow(type, amount, ...) would change the zoom level.
     bool ZoomWindowTest(Tavo_GrZoom::Type type, int amount) const;
@@ -205,9 +208,13 @@ protected:
 private:
     // Re-derives the scroll model (range, deltas, extent, position) from the
     // mapping after zooming it by type and amount about a device point (null:
-    // the view's centre, or the drawing's at the zero level). Invalidates the
+    // the view's centre, or the drawing's at the zero level), once more when
+    // laying out the scroll bars changed the scrollee's size. Invalidates the
     // scrollee when the view changed or force is set.
     void InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force);
+    // Sets the scroll range, deltas, extent and position from the mapping's
+    // view of a scrollee of the given size, and lays out.
+    void DeriveScrollModel(const Tavo_GrWRect& bounds, const CSize& size);
     // The pointer as a device point of the scrollee, unclipped; (0, 0) unbound.
     Tavo_GrDPoint GetCursorPositionInScrollee();
     // The scrollee's client size.

@@ -25,6 +25,9 @@ public:
         AlignMiddle = 12,
         AlignDefault = AlignLeft | AlignBottom, // 5
     };
+    // The bits of an alignment code that hold its horizontal and its vertical part.
+    static constexpr char kHorizontalAlignMask = 3;
+    static constexpr char kVerticalAlignMask = 12;
 
     constexpr Tavo_GrAttr() = default;
     constexpr Tavo_GrAttr(char color, char fill, int charHeight = 0, char textAlign = AlignDefault)

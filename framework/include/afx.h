@@ -23,10 +23,10 @@
 // The packed, signed coordinates of a mouse message (as <windowsx.h> has
 // them; that header's function-like macros would clash with member names).
 #ifndef GET_X_LPARAM
-#define GET_X_LPARAM(lp) ((int)(short)LOWORD(lp))
+#define GET_X_LPARAM(lp) static_cast<int>(static_cast<short>(LOWORD(lp)))
 #endif
 #ifndef GET_Y_LPARAM
-#define GET_Y_LPARAM(lp) ((int)(short)HIWORD(lp))
+#define GET_Y_LPARAM(lp) static_cast<int>(static_cast<short>(HIWORD(lp)))
 #endif
 
 #include <cstdarg>

@@ -28,7 +28,10 @@ void Tavo_WiDrawWnd::SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, i
                                     int zeroLevelExpansion, unsigned int maxClipWidth,
                                     unsigned int maxClipHeight)
 {
+    // The undo clip box is a view of the old drawing: it goes with the
+    // mapping, so an undo after rebinding does nothing.
     m_mapping.reset();
+    m_undoClipBox = Tavo_GrWRect();
     m_drawing = drawing;
     if (!drawing)
         return;

@@ -12,6 +12,7 @@
 #include "Tavo_GrTypes.h"
 
 #include <algorithm>
+#include <climits>
 #include <cmath>
 
 namespace Tavo_WiViewMath {
@@ -83,10 +84,15 @@ struct DeviceDelta
 
 inline DeviceDelta ToDeviceDelta(long long worldDelta, double scale)
 {
-    const double exact = static_cast<double>(worldDelta) * scale;
-    if (!std::isfinite(exact))
+    if (worldDelta == 0 || !(scale > 0.0))
         return {};
+    const double exact = static_cast<double>(worldDelta) * scale;
     const int pixels = Tavo_GrRound(exact);
+    // A move beyond the int range uncovers the whole view: no moved pixel
+    // stays to line up with, so no error is kept (it could not be measured
+    // in int pixels anyway).
+    if (!(std::fabs(exact) < static_cast<double>(INT_MAX)))
+        return {pixels, 0.0};
     return {pixels, pixels - exact};
 }
 

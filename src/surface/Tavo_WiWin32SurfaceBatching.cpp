@@ -168,8 +168,8 @@ void Tavo_WiWin32Surface::FlushDots()
     m_stats.Add(Tavo_GrSurfaceStats::Dots, m_dots.m_count);
     m_dots.m_count = 0;
     // Repeat suppression only spans dots still waiting in the batch.
-    m_lastDotX = -1;
-    m_lastDotY = -1;
+    m_lastDotX = kNoDotSinceEmission;
+    m_lastDotY = kNoDotSinceEmission;
 }
 
 void Tavo_WiWin32Surface::FlushLines()

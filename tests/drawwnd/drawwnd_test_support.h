@@ -38,6 +38,7 @@ public:
     DragAction dragAction = Pan;
     CString dataTipText;
     int paints = 0;     // passes of the full paint path that reached the drawing
+    Tavo_GrDRect lastPaintRect;     // the device rectangle the last of them repainted
     std::function<void()> onPaint;  // run at each of those passes, before the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
@@ -60,6 +61,7 @@ protected:
                 Tavo_GrMapping* mapping, Tavo_GrDRect& rect) override
     {
         ++paints;
+        lastPaintRect = rect;
         if (onPaint)
             onPaint();
         Tavo_WiDrawWnd::OnDraw(scrollee, dc, drawing, s, mapping, rect);
@@ -120,6 +122,24 @@ void AddFilledRect(Tavo_GrDrawing& drawing, const Tavo_GrWRect& rect, char colou
 
 // Paints every pending update of the window at once.
 void PaintNow(HWND window);
+
+// The bounding box of a window's pending update region, in its client
+// coordinates; empty when nothing waits to be painted.
+CRect PendingUpdate(HWND window);
+
+// A window's client area as on screen, row by row from the top, 0x00RRGGBB.
+struct ClientPicture
+{
+    int width = 0;
+    int height = 0;
+    std::vector<unsigned int> pixels;
+
+    unsigned int At(int x, int y) const { return pixels[static_cast<size_t>(y) * width + x]; }
+};
+ClientPicture Snapshot(HWND window);
+// How many pixels of two pictures of the same size differ (all of them when
+// the sizes differ).
+long DifferingPixels(const ClientPicture& a, const ClientPicture& b);
 
 }  // namespace DrawWndTest
 
