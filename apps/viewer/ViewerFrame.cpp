@@ -42,7 +42,7 @@ BOOL ViewerFrame::CreateFrame(std::unique_ptr<ViewerDocument> document, int x, i
         return FALSE;
     }
     m_accelerators = ViewerCommands::CreateAccelerators();
-    if (!m_statusBar.Create(this, StatusBarId))
+    if (!m_statusBar.CreateBar(this, StatusBarId))
         return FALSE;
     CRect client(0, 0, 0, 0);
     GetClientRect(&client);

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-BOOL ViewerStatusBar::Create(CWnd* parent, UINT id)
+BOOL ViewerStatusBar::CreateBar(CWnd* parent, UINT id)
 {
     // The bar places itself; the rectangle is only a placeholder.
     return CStatusBarCtrl::Create(WS_CHILD | WS_VISIBLE | SBARS_SIZEGRIP, CRect(0, 0, 0, 0), parent, id);

@@ -25,7 +25,7 @@ public:
     // the bar (SB_GETTEXT has no buffer size) must make room for.
     static constexpr size_t MaxPartLength = 255;
 
-    BOOL Create(CWnd* parent, UINT id);
+    BOOL CreateBar(CWnd* parent, UINT id);
     // Places the bar along the parent's bottom edge and divides it for a
     // parent client area width pixels wide; returns the bar's height.
     int Layout(int width);
