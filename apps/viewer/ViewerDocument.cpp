@@ -68,10 +68,6 @@ OpenDrawingResult OpenDrawing(const std::string& path)
                        (imported.error.line > 0 ? " (line " + std::to_string(imported.error.line) + ")." : ".");
         return result;
     }
-    if (document->GetDrawing().IsEmpty()) {
-        result.error = "Cannot open " + name + ": it holds nothing the viewer can draw.";
-        return result;
-    }
     for (const Tavo_DxfMessage& warning : imported.warnings)
         result.warnings.push_back(warning.line > 0 ? "line " + std::to_string(warning.line) + ": " + warning.text
                                                    : warning.text);

@@ -40,7 +40,7 @@ struct OpenDrawingResult {
 
 // Reads the DXF drawing file at path (a Windows path) into a new document,
 // in the importer's world units (DrawingUnits maps them back to the file's).
-// A file that cannot be read, that the importer refuses or that holds
-// nothing to draw is refused with a message that names the file and says
-// why; entities the importer skipped are listed as warnings.
+// A file that cannot be read or that the importer refuses is refused with a
+// message that names the file and says why; entities the importer skipped
+// are listed as warnings. A drawing with nothing to draw opens empty.
 OpenDrawingResult OpenDrawing(const std::string& path);

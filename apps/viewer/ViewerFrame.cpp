@@ -65,9 +65,11 @@ bool ViewerFrame::OpenFile(const std::string& path, std::string& error)
         return false;
     }
     ShowDocument(std::move(opened.document));
-    if (!opened.warnings.empty())
-        ShowMessage("Opened with " + std::to_string(opened.warnings.size()) +
-                    " warnings; the first: " + opened.warnings.front());
+    const size_t warnings = opened.warnings.size();
+    if (warnings == 1)
+        ShowMessage("Opened with a warning: " + opened.warnings.front());
+    else if (warnings > 1)
+        ShowMessage("Opened with " + std::to_string(warnings) + " warnings; the first: " + opened.warnings.front());
     return true;
 }
 
