@@ -41,9 +41,9 @@ private:
 
     POINT Flip(const Tavo_GrDPoint& point) const { return {point.x, GetDeviceHeight() - point.y}; }
 
-    HDC m_hdc = nullptr; // the owner's
-    std::array<HPEN, kColourCount> m_pens = {};       // owned
-    std::array<HBRUSH, kColourCount> m_brushes = {};  // owned
+    HDC m_hdc = nullptr;                             // the owner's
+    std::array<HPEN, kColourCount> m_pens = {};      // owned
+    std::array<HBRUSH, kColourCount> m_brushes = {}; // owned
     std::array<COLORREF, kColourCount> m_colours = {};
     COLORREF m_colour = 0;
     // What the first selection of a pass displaced, given back by EndDrawing.

@@ -209,7 +209,7 @@ private:
 struct Measure {
     Measure(const char* n, double t) : name(n), target(t) {}
     const char* name;
-    double target;                      // largest ratio to the full paint; 0: none
+    double target; // largest ratio to the full paint; 0: none
     std::vector<double> seconds;
     std::vector<double> ratios;         // to the full paint of the same run
     long long systemAllocations = 0;    // most in one action, by the library's DLLs

@@ -39,15 +39,13 @@
 
 struct CPrintInfo;
 
-class AFX_EXT_CLASS Tavo_WiDrawWnd : public Tavo_WiScrollWnd
-{
+class AFX_EXT_CLASS Tavo_WiDrawWnd : public Tavo_WiScrollWnd {
 public:
     // What a drag does (GetDragAction). Any other value: nothing.
-    enum DragAction
-    {
-        Pan = 0,                // moves the view with the pointer (only while zoomed in)
-        RubberRectangle = 1,    // DoRubberRectangle
-        DragAndDrop = 2         // DoDragAndDrop
+    enum DragAction {
+        Pan = 0,             // moves the view with the pointer (only while zoomed in)
+        RubberRectangle = 1, // DoRubberRectangle
+        DragAndDrop = 2      // DoDragAndDrop
     };
 
     // The autoscroll timer of a pan drag that has left the view: on this
@@ -224,19 +222,19 @@ private:
     // The world rectangle the device rectangle (0, 0, width, height) shows.
     Tavo_GrWRect VisibleWorldRect(int width, int height) const;
 
-    Tavo_GrDrawing* m_drawing = nullptr;                 // not owned
-    std::unique_ptr<Tavo_GrMapping> m_mapping;           // exactly while a drawing is bound
-    int m_surfaceOption = 3;                             // copied into every on-screen surface
-    int m_panDirection = 1;                              // +1 or -1
+    Tavo_GrDrawing* m_drawing = nullptr;       // not owned
+    std::unique_ptr<Tavo_GrMapping> m_mapping; // exactly while a drawing is bound
+    int m_surfaceOption = 3;                   // copied into every on-screen surface
+    int m_panDirection = 1;                    // +1 or -1
     // During a pan drag: the scrollee's window size at its start and the
     // reference pointer position. During a live resize: the scrollee's client
     // size and the scroll position when it began.
     CSize m_savedSize{0, 0};
     CPoint m_savedPoint{0, 0};
-    Tavo_GrWRect m_undoClipBox;                          // the view before the last zoom
+    Tavo_GrWRect m_undoClipBox; // the view before the last zoom
     Tavo_WiPrintLayout m_printLayout;
-    UINT m_autoScrollTimerId = 0;                        // while the autoscroll timer runs
-    int m_sizing = 0;                                    // 1 during a live resize
-    int m_panDrag = 0;                                   // 1 during a pan drag
-    int m_zoomedIn = 1;                                  // after InternalZoom: L != 0
+    UINT m_autoScrollTimerId = 0; // while the autoscroll timer runs
+    int m_sizing = 0;             // 1 during a live resize
+    int m_panDrag = 0;            // 1 during a pan drag
+    int m_zoomedIn = 1;           // after InternalZoom: L != 0
 };

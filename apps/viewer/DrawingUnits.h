@@ -14,8 +14,8 @@
 #include <string>
 
 struct DrawingUnits {
-    double scale = 1.0;     // world units per drawing unit, positive
-    double originX = 0.0;   // the drawing point at world (0, 0)
+    double scale = 1.0;   // world units per drawing unit, positive
+    double originX = 0.0; // the drawing point at world (0, 0)
     double originY = 0.0;
 
     double ToDrawingX(double worldX) const { return worldX / scale + originX; }
@@ -58,4 +58,4 @@ inline std::string Length(double value)
     return text;
 }
 
-}  // namespace DrawingUnitsText
+} // namespace DrawingUnitsText

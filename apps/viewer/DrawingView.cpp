@@ -99,7 +99,8 @@ void DrawingView::DoRubberRectangle(UINT button, UINT flags, const CPoint& start
     // The rectangle's own message loop takes the button's release, so the
     // parked cursor monitor, which saw the press, would wait for a release
     // and show no data tip until the next click. It is shown the release.
-    const UINT release = button == MK_RBUTTON ? WM_RBUTTONUP : button == MK_MBUTTON ? WM_MBUTTONUP : WM_LBUTTONUP;
+    const UINT release = button == MK_RBUTTON ? WM_RBUTTONUP : button == MK_MBUTTON ? WM_MBUTTONUP
+                                                                                    : WM_LBUTTONUP;
     MSG message = {};
     message.hwnd = GetScrollee()->GetSafeHwnd();
     message.message = release;

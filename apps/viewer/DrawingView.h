@@ -23,8 +23,7 @@
 
 #include <string>
 
-class DrawingView : public Tavo_WiDrawWnd
-{
+class DrawingView : public Tavo_WiDrawWnd {
 public:
     DrawingView();
     ~DrawingView() override;
@@ -39,10 +38,10 @@ public:
     void SetStatusBar(ViewerStatusBar* statusBar) { m_statusBar = statusBar; }
 
     // ---- commands ------------------------------------------------------------
-    void ZoomIn();          // about the view's centre
+    void ZoomIn(); // about the view's centre
     void ZoomOut();
     void ZoomToFit();
-    void UndoZoom();        // a second undo returns (a toggle)
+    void UndoZoom(); // a second undo returns (a toggle)
     void Scroll(Tavo_WiScroll::Dir dir, Tavo_WiScroll::Amount amount);
 
     // What lies under a client point of the scrollee, in the viewer's words.
@@ -68,9 +67,9 @@ protected:
 
 public:
     // The scrollee's point forms, as public as the drawing window has them.
+    using Tavo_WiDrawWnd::GetDataTipText;
     using Tavo_WiDrawWnd::OnClick;
     using Tavo_WiDrawWnd::OnDoubleClick;
-    using Tavo_WiDrawWnd::GetDataTipText;
 
     afx_msg BOOL OnMouseWheel(UINT flags, short delta, CPoint point);
     afx_msg void OnWindowPosChanged(WINDOWPOS* windowPos);
@@ -83,9 +82,9 @@ private:
     void ShowPointer(const CPoint& point);
     void ShowMessage(const std::string& text);
 
-    ViewerDocument* m_document = nullptr;       // not owned
-    ViewerStatusBar* m_statusBar = nullptr;     // not owned
+    ViewerDocument* m_document = nullptr;   // not owned
+    ViewerStatusBar* m_statusBar = nullptr; // not owned
     Tavo_WiNativeWindowSurface m_screenSurface;
     Tavo_WiWin32Surface m_printSurface;
-    int m_wheelRemainder = 0;                   // wheel delta short of a notch
+    int m_wheelRemainder = 0; // wheel delta short of a notch
 };

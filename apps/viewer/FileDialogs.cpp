@@ -25,7 +25,7 @@ bool Ask(HWND owner, const char* filter, const char* defaultExtension, DWORD fla
     return true;
 }
 
-}  // namespace
+} // namespace
 
 bool AskOpenPath(HWND owner, const char* filter, std::string& path)
 {
@@ -37,4 +37,4 @@ bool AskSavePath(HWND owner, const char* filter, const char* defaultExtension, s
     return Ask(owner, filter, defaultExtension, OFN_OVERWRITEPROMPT | OFN_PATHMUSTEXIST, true, path);
 }
 
-}  // namespace FileDialogs
+} // namespace FileDialogs

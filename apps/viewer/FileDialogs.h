@@ -13,4 +13,4 @@ bool AskOpenPath(HWND owner, const char* filter, std::string& path);
 // defaultExtension (without the dot) is added to a name typed without one.
 bool AskSavePath(HWND owner, const char* filter, const char* defaultExtension, std::string& path);
 
-}  // namespace FileDialogs
+} // namespace FileDialogs

@@ -24,7 +24,7 @@ std::string Quoted(const char* text)
     return "\"" + quoted + "\"";
 }
 
-}  // namespace
+} // namespace
 
 namespace ItemDescription {
 
@@ -56,7 +56,7 @@ std::string Describe(const Tavo_GrItemInfo& topmost, int count, const DrawingUni
     const double width = static_cast<double>(topmost.bounds.x2) - topmost.bounds.x1;
     const double height = static_cast<double>(topmost.bounds.y2) - topmost.bounds.y1;
     text += ", " + DrawingUnitsText::Length(units.ToDrawingLength(width)) + " x " +
-            DrawingUnitsText::Length(units.ToDrawingLength(height));
+        DrawingUnitsText::Length(units.ToDrawingLength(height));
     if (count > 1)
         text += " (and " + std::to_string(count - 1) + " more)";
     return text;
@@ -72,4 +72,4 @@ std::string DescribeAperture(const Tavo_GrDrawing& drawing, const Tavo_GrWRect& 
     return count == 0 ? std::string("Nothing here") : Describe(topmost, count, units);
 }
 
-}  // namespace ItemDescription
+} // namespace ItemDescription

@@ -27,4 +27,4 @@ std::string Describe(const Tavo_GrItemInfo& topmost, int count, const DrawingUni
 // the topmost item found there.
 std::string DescribeAperture(const Tavo_GrDrawing& drawing, const Tavo_GrWRect& aperture, const DrawingUnits& units);
 
-}  // namespace ItemDescription
+} // namespace ItemDescription

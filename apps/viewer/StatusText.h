@@ -31,4 +31,4 @@ inline std::string Zoom(double level, int levelsPerDoubling)
     return std::string("Zoom level ") + levelText + " (" + times + "x)";
 }
 
-}  // namespace StatusText
+} // namespace StatusText

@@ -7,10 +7,9 @@ namespace ViewerCommands {
 
 namespace {
 
-struct MenuItem
-{
-    UINT id;             // 0: a separator
-    const char* label;   // with the key after a tab
+struct MenuItem {
+    UINT id;           // 0: a separator
+    const char* label; // with the key after a tab
 };
 
 const MenuItem FileItems[] = {
@@ -62,7 +61,7 @@ HMENU CreatePopup(const MenuItem (&items)[N])
     return popup;
 }
 
-}  // namespace
+} // namespace
 
 HMENU CreateMenuBar()
 {
@@ -79,4 +78,4 @@ HACCEL CreateAccelerators()
     return ::CreateAcceleratorTableA(keys, static_cast<int>(std::size(keys)));
 }
 
-}  // namespace ViewerCommands
+} // namespace ViewerCommands

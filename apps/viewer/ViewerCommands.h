@@ -6,8 +6,7 @@
 
 namespace ViewerCommands {
 
-enum Id : UINT
-{
+enum Id : UINT {
     FileOpen = 100,
     FilePrint = 101,
     FileExport = 102,
@@ -33,4 +32,4 @@ HMENU CreateMenuBar();
 // destroys it (DestroyAcceleratorTable).
 HACCEL CreateAccelerators();
 
-}  // namespace ViewerCommands
+} // namespace ViewerCommands

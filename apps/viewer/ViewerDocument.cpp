@@ -37,7 +37,7 @@ std::string UnreadableReason(const std::string& path)
     }
 }
 
-}  // namespace
+} // namespace
 
 std::unique_ptr<ViewerDocument> MakeSampleDocument()
 {
@@ -65,7 +65,7 @@ OpenDrawingResult OpenDrawing(const std::string& path)
     const Tavo_DxfImportResult imported = Tavo_DxfImportFile(path.c_str(), document->GetDrawing(), colours);
     if (!imported.ok) {
         result.error = "Cannot open " + name + ": " + imported.error.text +
-                       (imported.error.line > 0 ? " (line " + std::to_string(imported.error.line) + ")." : ".");
+            (imported.error.line > 0 ? " (line " + std::to_string(imported.error.line) + ")." : ".");
         return result;
     }
     for (const Tavo_DxfMessage& warning : imported.warnings)

@@ -33,9 +33,9 @@ private:
 std::unique_ptr<ViewerDocument> MakeSampleDocument();
 
 struct OpenDrawingResult {
-    std::unique_ptr<ViewerDocument> document;   // null when the file was refused
-    std::string error;                          // why it was refused
-    std::vector<std::string> warnings;          // what was skipped, one line each
+    std::unique_ptr<ViewerDocument> document; // null when the file was refused
+    std::string error;                        // why it was refused
+    std::vector<std::string> warnings;        // what was skipped, one line each
 };
 
 // Reads the DXF drawing file at path (a Windows path) into a new document,

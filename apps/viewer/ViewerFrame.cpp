@@ -11,7 +11,7 @@ constexpr char DrawingFilter[] = "DXF drawings (*.dxf)\0*.dxf\0All files (*.*)\0
 constexpr char PngFilter[] = "PNG pictures (*.png)\0*.png\0";
 constexpr char PostScriptFilter[] = "PostScript files (*.ps)\0*.ps\0";
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(ViewerFrame, CWnd)
     ON_WM_SIZE()

@@ -14,8 +14,7 @@
 #include <memory>
 #include <string>
 
-class ViewerFrame : public CWnd
-{
+class ViewerFrame : public CWnd {
 public:
     static constexpr UINT ViewId = 1;
     static constexpr UINT StatusBarId = 2;
@@ -68,6 +67,6 @@ private:
     std::unique_ptr<ViewerDocument> m_document;
     ViewerStatusBar m_statusBar;
     DrawingView m_view;
-    HACCEL m_accelerators = nullptr;    // owned
+    HACCEL m_accelerators = nullptr; // owned
     std::string m_printOutput;
 };

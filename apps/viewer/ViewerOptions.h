@@ -8,8 +8,7 @@
 
 #include <string>
 
-struct ViewerOptions
-{
+struct ViewerOptions {
     std::string file;       // a Windows path; empty: the built-in sample
     std::string tourFolder; // set: run the tour, its pictures go here
     bool help = false;

@@ -36,7 +36,7 @@ Result Failure(const std::string& message)
     return result;
 }
 
-}  // namespace
+} // namespace
 
 Result PrintView(DrawingView& view, CWnd* owner, const std::string& title, const std::string& outputFile,
                  const AskOutputFile& askOutput)
@@ -107,9 +107,9 @@ Result PrintView(DrawingView& view, CWnd* owner, const std::string& title, const
 
     result.outcome = Outcome::Printed;
     result.message = "Printed " + std::to_string(result.pages) + (result.pages == 1 ? " page" : " pages") +
-                     " of the " + std::to_string(result.columns) + " x " + std::to_string(result.rows) +
-                     " page grid" + (result.output.empty() ? std::string(".") : " to " + result.output + ".");
+        " of the " + std::to_string(result.columns) + " x " + std::to_string(result.rows) +
+        " page grid" + (result.output.empty() ? std::string(".") : " to " + result.output + ".");
     return result;
 }
 
-}  // namespace ViewerPrinting
+} // namespace ViewerPrinting

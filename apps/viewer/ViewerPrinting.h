@@ -15,21 +15,19 @@ class DrawingView;
 
 namespace ViewerPrinting {
 
-enum class Outcome
-{
+enum class Outcome {
     Printed,
-    Cancelled,  // the dialog or the output file was not confirmed
+    Cancelled, // the dialog or the output file was not confirmed
     Failed
 };
 
-struct Result
-{
+struct Result {
     Outcome outcome = Outcome::Failed;
-    int pages = 0;          // pages sent to the printer
-    int columns = 0;        // the page grid
+    int pages = 0;   // pages sent to the printer
+    int columns = 0; // the page grid
     int rows = 0;
-    std::string output;     // the file the job went to; empty: the printer's port
-    std::string message;    // a sentence for the status bar
+    std::string output;  // the file the job went to; empty: the printer's port
+    std::string message; // a sentence for the status bar
 };
 
 // Asks for the file a job goes to when the printer writes to a file; false
@@ -43,4 +41,4 @@ using AskOutputFile = std::function<bool(std::string& path)>;
 Result PrintView(DrawingView& view, CWnd* owner, const std::string& title, const std::string& outputFile,
                  const AskOutputFile& askOutput);
 
-}  // namespace ViewerPrinting
+} // namespace ViewerPrinting

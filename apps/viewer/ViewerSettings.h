@@ -31,4 +31,4 @@ constexpr COLORREF Background = RGB(255, 255, 255);
 constexpr int FrameWidth = 1024;
 constexpr int FrameHeight = 768;
 
-}  // namespace ViewerSettings
+} // namespace ViewerSettings

@@ -7,11 +7,9 @@
 
 #include <string>
 
-class ViewerStatusBar : public CStatusBarCtrl
-{
+class ViewerStatusBar : public CStatusBarCtrl {
 public:
-    enum Part
-    {
+    enum Part {
         Message = 0,
         Pointer = 1,
         Zoom = 2,

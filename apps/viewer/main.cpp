@@ -49,7 +49,7 @@ int RunViewer(CWinApp& app, const ViewerOptions& options, int showCommand)
     return app.Run();
 }
 
-}  // namespace
+} // namespace
 
 int WINAPI WinMain(HINSTANCE, HINSTANCE, LPSTR, int showCommand)
 {

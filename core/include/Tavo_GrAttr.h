@@ -48,8 +48,7 @@ public:
 
     bool operator==(const Tavo_GrAttr& other) const
     {
-        return m_color == other.m_color && m_fill == other.m_fill && m_charHeight == other.m_charHeight
-            && m_textAlign == other.m_textAlign;
+        return m_color == other.m_color && m_fill == other.m_fill && m_charHeight == other.m_charHeight && m_textAlign == other.m_textAlign;
     }
     bool operator!=(const Tavo_GrAttr& other) const { return !(*this == other); }
 

@@ -70,7 +70,18 @@ struct Tavo_GrDrawingData;
 struct Tavo_GrLayerData;
 
 // The kinds of items, in the terms of Tavo_GrDrawingBuilder's Add operations.
-enum class Tavo_GrItemKind : uint8_t { Dot, Line, Polyline, Polygon, Rect, Circle, Triangle, Text, TextBox, Call };
+enum class Tavo_GrItemKind : uint8_t {
+    Dot,
+    Line,
+    Polyline,
+    Polygon,
+    Rect,
+    Circle,
+    Triangle,
+    Text,
+    TextBox,
+    Call
+};
 
 class TAVO_CORE_API Tavo_GrCall {
 public:
@@ -124,8 +135,8 @@ struct Tavo_GrItemInfo {
     int index = 0;                       // the item's place in its layer, from 0, in the order added
     Tavo_GrItemKind kind = Tavo_GrItemKind::Dot;
     Tavo_GrAttr attr;
-    Tavo_GrWRect bounds;                 // the item's world bounds (see above)
-    const char* text = nullptr;          // a text's or text box's text; null for other kinds
+    Tavo_GrWRect bounds;        // the item's world bounds (see above)
+    const char* text = nullptr; // a text's or text box's text; null for other kinds
 };
 
 // Called with each item found; returning false stops the search.

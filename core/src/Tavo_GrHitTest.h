@@ -83,8 +83,7 @@ inline bool PolygonMeets(const Tavo_GrWPoint* points, int count, bool filled, co
 {
     if (ChainMeets(points, count, true, r))
         return true;
-    return filled && count >= 3
-        && PolygonContains(points, count, (static_cast<double>(r.x1) + r.x2) / 2, (static_cast<double>(r.y1) + r.y2) / 2);
+    return filled && count >= 3 && PolygonContains(points, count, (static_cast<double>(r.x1) + r.x2) / 2, (static_cast<double>(r.y1) + r.y2) / 2);
 }
 
 // A circle meets r when its rim passes through r (the nearest point of r is

@@ -12,8 +12,7 @@
 // places and sizes itself: it takes its parent's width and its own height
 // whenever it receives WM_SIZE, so the rectangle given to Create is ignored
 // and a parent passes its WM_SIZE on to it.
-class AFX_FRAMEWORK_CLASS CStatusBarCtrl : public CWnd
-{
+class AFX_FRAMEWORK_CLASS CStatusBarCtrl : public CWnd {
 public:
     CStatusBarCtrl() = default;
     ~CStatusBarCtrl() override = default;
@@ -42,4 +41,4 @@ private:
     using CWnd::Create;
 };
 
-#endif  // TAVO_FRAMEWORK_AFXCMN_H
+#endif // TAVO_FRAMEWORK_AFXCMN_H

@@ -15,7 +15,7 @@ int SplitLengthAndType(LRESULT answer, int* pType)
     return LOWORD(answer);
 }
 
-}  // namespace
+} // namespace
 
 BOOL CStatusBarCtrl::Create(DWORD dwStyle, const RECT& rect, CWnd* pParentWnd, UINT nID)
 {

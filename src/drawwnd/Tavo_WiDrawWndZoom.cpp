@@ -19,7 +19,7 @@ bool IsEmptyArea(const CSize& size)
     return size.cx <= 0 || size.cy <= 0;
 }
 
-}  // namespace
+} // namespace
 
 void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force)
 {

@@ -49,8 +49,7 @@ inline Tavo_GrWRect Offset(const Tavo_GrWRect& r, long long dx, long long dy)
 }
 
 // The scroll range of a view, as xMin, xMax, yMin, yMax.
-struct ScrollRange
-{
+struct ScrollRange {
     int xMin = 0;
     int xMax = 0;
     int yMin = 0;
@@ -76,8 +75,7 @@ inline ScrollRange ScrollRangeFor(const Tavo_GrWRect& bounds, const Tavo_GrWRect
 
 // A world delta in device pixels, rounded, with what the rounding left over
 // (rounded minus exact), which the mapping keeps as its error term.
-struct DeviceDelta
-{
+struct DeviceDelta {
     int pixels = 0;
     double error = 0.0;
 };
@@ -150,4 +148,4 @@ inline int AutoScrollPercent(int position, int size)
     return std::max(1, Tavo_GrTruncate(ratio * ratio * 10.0));
 }
 
-}  // namespace Tavo_WiViewMath
+} // namespace Tavo_WiViewMath

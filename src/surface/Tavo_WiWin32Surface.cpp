@@ -78,7 +78,8 @@ Tavo_WiWin32Surface::Tavo_WiWin32Surface()
     if (!m_2array) {
         // Entry n is the length of the count array for n-point polylines.
         const int maxCounts[6] = {
-            0, 0,
+            0,
+            0,
             kDotCapacity > kLineCapacity ? kDotCapacity : kLineCapacity,
             kUniangleCapacity,
             kHollowTriangleCapacity > kFilledTriangleCapacity ? kHollowTriangleCapacity : kFilledTriangleCapacity,

@@ -13,7 +13,6 @@
 #pragma push_macro("DrawText")
 #undef DrawText
 
-
 namespace {
 
 void SetPoint(POINT& point, int x, int y)

@@ -42,39 +42,34 @@ struct ShapeCase {
     char fill;
     void (*add)(Tavo_GrDrawingBuilder&);
     Tavo_GrWPoint on;
-    Tavo_GrWPoint off;   // inside the bounds, outside the shape
+    Tavo_GrWPoint off; // inside the bounds, outside the shape
 };
 
 const ShapeCase kShapeCases[] = {
     {"diagonal line", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddLine(0, 0, 1000, 1000); }, {500, 500}, {800, 100}},
-    {"polyline (open: no closing segment)", Hollow,
-     [](Tavo_GrDrawingBuilder& b) {
+    {"polyline (open: no closing segment)", Hollow, [](Tavo_GrDrawingBuilder& b) {
          const Tavo_GrWPoint p[3] = {{0, 0}, {1000, 0}, {1000, 1000}};
          b.AddPolyline(3, p);
      },
-     {1000, 600}, {500, 500}},
-    {"hollow rectangle: its outline", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddRect(0, 0, 1000, 600); },
-     {1000, 300}, {500, 300}},
-    {"filled rectangle: its inside", Filled, [](Tavo_GrDrawingBuilder& b) { b.AddRect(0, 0, 1000, 600); },
-     {500, 300}, {1200, 300}},
-    {"hollow circle: its rim", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddCircle(500, 500, 400); }, {900, 500},
+     {1000, 600},
      {500, 500}},
-    {"filled circle: its disc, not the corners of its box", Filled,
-     [](Tavo_GrDrawingBuilder& b) { b.AddCircle(500, 500, 400); }, {500, 500}, {140, 140}},
-    {"filled L-shaped polygon: not its notch", Filled,
-     [](Tavo_GrDrawingBuilder& b) {
+    {"hollow rectangle: its outline", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddRect(0, 0, 1000, 600); }, {1000, 300}, {500, 300}},
+    {"filled rectangle: its inside", Filled, [](Tavo_GrDrawingBuilder& b) { b.AddRect(0, 0, 1000, 600); }, {500, 300}, {1200, 300}},
+    {"hollow circle: its rim", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddCircle(500, 500, 400); }, {900, 500}, {500, 500}},
+    {"filled circle: its disc, not the corners of its box", Filled, [](Tavo_GrDrawingBuilder& b) { b.AddCircle(500, 500, 400); }, {500, 500}, {140, 140}},
+    {"filled L-shaped polygon: not its notch", Filled, [](Tavo_GrDrawingBuilder& b) {
          const Tavo_GrWPoint p[6] = {{0, 0}, {1000, 0}, {1000, 400}, {400, 400}, {400, 1000}, {0, 1000}};
          b.AddPolygon(6, p);
      },
-     {200, 800}, {700, 700}},
-    {"hollow polygon: its closing edge", Hollow,
-     [](Tavo_GrDrawingBuilder& b) {
+     {200, 800},
+     {700, 700}},
+    {"hollow polygon: its closing edge", Hollow, [](Tavo_GrDrawingBuilder& b) {
          const Tavo_GrWPoint p[4] = {{0, 0}, {1000, 0}, {1000, 1000}, {0, 1000}};
          b.AddPolygon(4, p);
      },
-     {0, 500}, {500, 500}},
-    {"filled triangle: not beyond its slanted side", Filled,
-     [](Tavo_GrDrawingBuilder& b) { b.AddTriangle({0, 0}, {1000, 0}, {0, 1000}); }, {200, 200}, {800, 800}},
+     {0, 500},
+     {500, 500}},
+    {"filled triangle: not beyond its slanted side", Filled, [](Tavo_GrDrawingBuilder& b) { b.AddTriangle({0, 0}, {1000, 0}, {0, 1000}); }, {200, 200}, {800, 800}},
     {"dot", Hollow, [](Tavo_GrDrawingBuilder& b) { b.AddDot(300, 300); }, {301, 299}, {310, 300}},
 };
 

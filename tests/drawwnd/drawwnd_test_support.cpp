@@ -12,12 +12,11 @@ constexpr UINT DrawWndId = 42;
 
 // The core is initialised once for the whole test program, as an
 // application does at start.
-struct LibraryInitialisation
-{
+struct LibraryInitialisation {
     LibraryInitialisation() { Tavo_WiLibrary::Initialize(); }
 };
 
-}  // namespace
+} // namespace
 
 HostedDrawWnd::HostedDrawWnd(const CRect& clientRect, const CRect& hostRect) : host(hostRect)
 {
@@ -72,7 +71,7 @@ ClientPicture Snapshot(HWND window)
     BITMAPINFO info = {};
     info.bmiHeader.biSize = sizeof info.bmiHeader;
     info.bmiHeader.biWidth = picture.width;
-    info.bmiHeader.biHeight = -picture.height;  // top-down rows
+    info.bmiHeader.biHeight = -picture.height; // top-down rows
     info.bmiHeader.biPlanes = 1;
     info.bmiHeader.biBitCount = 32;
     info.bmiHeader.biCompression = BI_RGB;
@@ -104,4 +103,4 @@ long DifferingPixels(const ClientPicture& a, const ClientPicture& b)
     return differing;
 }
 
-}  // namespace DrawWndTest
+} // namespace DrawWndTest

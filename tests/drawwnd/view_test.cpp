@@ -33,8 +33,7 @@ const Tavo_WiScroll::Dir AllDirs[] = {Left, Right, Up, Down};
 // 1000 x 800 world units: red on the left half, white on the right, a blue
 // band along the bottom 100 units. In a 500 x 400 scrollee the zero level
 // shows it at exactly half a pixel per unit.
-struct HalvesDrawing
-{
+struct HalvesDrawing {
     HalvesDrawing()
     {
         AddFilledRect(drawing, {0, 0, 500, 800}, Red);
@@ -48,8 +47,7 @@ struct HalvesDrawing
 // Lines, circles, rectangles and text of many colours and sizes over 1000 x
 // 800 world units, so that a strip cut anywhere crosses shapes and words
 // whose pixels must meet the moved ones exactly.
-struct BusyDrawing
-{
+struct BusyDrawing {
     BusyDrawing()
     {
         AddShapes();
@@ -105,8 +103,7 @@ struct BusyDrawing
     Tavo_GrDrawing drawing;
 };
 
-class DrawWndViewTest : public ::testing::Test
-{
+class DrawWndViewTest : public ::testing::Test {
 protected:
     void Bind(int zeroLevelExpansion = 0)
     {
@@ -153,17 +150,21 @@ protected:
 TEST(ViewMath, ScrollRangeHasMarginsOnlyWhenZoomedIn)
 {
     const Tavo_GrWRect bounds = {0, 0, 1000, 800};
-    const Tavo_GrWRect visible = {-100, 200, 400, 900};  // sticks out left and above
+    const Tavo_GrWRect visible = {-100, 200, 400, 900}; // sticks out left and above
     const double nan = std::numeric_limits<double>::quiet_NaN();
     const double inf = std::numeric_limits<double>::infinity();
-    const struct { double scale; bool zoomedIn; int xMin, xMax, yMin, yMax; } cases[] = {
-        {1.0, false, -100, 1000, 0, 900},     // left and top from the view alone
-        {1.0, true, -200, 1100, -150, 950},   // 100 pixels are 100 units: 150 below, 50 above
-        {0.4, true, -350, 1250, -375, 1025},  // 100 pixels are 250 units
-        {0.0, true, -100, 1000, 0, 900},      // no usable scale: no margin
+    const struct {
+        double scale;
+        bool zoomedIn;
+        int xMin, xMax, yMin, yMax;
+    } cases[] = {
+        {1.0, false, -100, 1000, 0, 900},    // left and top from the view alone
+        {1.0, true, -200, 1100, -150, 950},  // 100 pixels are 100 units: 150 below, 50 above
+        {0.4, true, -350, 1250, -375, 1025}, // 100 pixels are 250 units
+        {0.0, true, -100, 1000, 0, 900},     // no usable scale: no margin
         {nan, true, -100, 1000, 0, 900},
         {inf, true, -100, 1000, 0, 900},
-        {1e-12, true, INT_MIN, INT_MAX, INT_MIN, 900 + INT_MAX / 2},  // saturates
+        {1e-12, true, INT_MIN, INT_MAX, INT_MIN, 900 + INT_MAX / 2}, // saturates
     };
     for (const auto& c : cases) {
         const Tavo_WiViewMath::ScrollRange r = Tavo_WiViewMath::ScrollRangeFor(bounds, visible, c.scale, c.zoomedIn);
@@ -178,16 +179,26 @@ TEST(ViewMath, DeltasRoundAwayFromZeroAndNeverLeaveAnUnboundedError)
 {
     // The ordinary cases are checked through the window; here the extremes.
     const double inf = std::numeric_limits<double>::infinity();
-    const struct { long long world; double scale; int pixels; double error; } toDevice[] = {
+    const struct {
+        long long world;
+        double scale;
+        int pixels;
+        double error;
+    } toDevice[] = {
         {-3, 1.5, -5, -0.5}, {1, 0.3, 0, -0.3}, {0, inf, 0, 0.0}, {5, 0.0, 0, 0.0},
         // Beyond int range the whole view is uncovered: nothing to line up with.
-        {10000, 1e6, INT_MAX, 0.0}, {-2, inf, INT_MIN, 0.0}};
+        {10000, 1e6, INT_MAX, 0.0},
+        {-2, inf, INT_MIN, 0.0}};
     for (const auto& c : toDevice) {
         const Tavo_WiViewMath::DeviceDelta d = Tavo_WiViewMath::ToDeviceDelta(c.world, c.scale);
         EXPECT_EQ(d.pixels, c.pixels) << c.world << " at " << c.scale;
         EXPECT_DOUBLE_EQ(d.error, c.error) << c.world << " at " << c.scale;
     }
-    const struct { int device; double scale; int world; } toWorld[] = {
+    const struct {
+        int device;
+        double scale;
+        int world;
+    } toWorld[] = {
         {7, 0.5, 14}, {-15, 10.0, -2}, {3, 0.0, 0}, {INT_MAX, 1e-3, INT_MAX}, {INT_MIN, 1e-3, -INT_MAX}};
     for (const auto& c : toWorld)
         EXPECT_EQ(Tavo_WiViewMath::ToWorldStep(c.device, c.scale), c.world) << c.device << " at " << c.scale;
@@ -249,9 +260,11 @@ TEST_F(DrawWndViewTest, DrawingBoundRightAfterCreateIsFittedToTheRealClientArea)
     EXPECT_GT(Wnd().paints, 0);
     // World y grows upwards: the blue band along the bottom of the drawing
     // fills the bottom 50 rows (client y grows downwards).
-    const struct { int x, y; COLORREF colour; } pixels[] = {
-        {100, 200, RedPixel}, {400, 200, WhitePixel}, {100, 352, BluePixel}, {400, 398, BluePixel},
-        {100, 347, RedPixel}, {248, 100, RedPixel},   {252, 100, WhitePixel}};
+    const struct {
+        int x, y;
+        COLORREF colour;
+    } pixels[] = {
+        {100, 200, RedPixel}, {400, 200, WhitePixel}, {100, 352, BluePixel}, {400, 398, BluePixel}, {100, 347, RedPixel}, {248, 100, RedPixel}, {252, 100, WhitePixel}};
     for (const auto& p : pixels)
         EXPECT_EQ(PixelAt(Scrollee(), p.x, p.y), p.colour) << p.x << ", " << p.y;
 }
@@ -283,15 +296,18 @@ TEST_F(DrawWndViewTest, InvalidateRectMarksTheScreenAreaWithItsMarginUnlessWholl
     Bind();
     // The clip box is (0, 0, 1000, 800) at half a pixel per unit; the
     // update region is clipped to the 500 x 400 client area.
-    const struct { Tavo_GrWRect world; CRect update; } cases[] = {
+    const struct {
+        Tavo_GrWRect world;
+        CRect update;
+    } cases[] = {
         {{0, 0, 0, 0}, CRect(0, 0, 0, 0)},
         {{1001, 100, 1200, 200}, CRect(0, 0, 0, 0)},
         {{-300, -200, -1, 100}, CRect(0, 0, 0, 0)},
         {{100, 801, 300, 900}, CRect(0, 0, 0, 0)},
         {{100, 100, 300, 200}, CRect(48, 298, 152, 352)},
-        {{300, 200, 100, 100}, CRect(48, 298, 152, 352)},   // corners in any order
-        {{1000, 100, 1200, 200}, CRect(498, 298, 500, 352)},  // shares the right edge only
-        {{-200, 800, 0, 900}, CRect(0, 0, 2, 2)},             // shares the top-left corner only
+        {{300, 200, 100, 100}, CRect(48, 298, 152, 352)},    // corners in any order
+        {{1000, 100, 1200, 200}, CRect(498, 298, 500, 352)}, // shares the right edge only
+        {{-200, 800, 0, 900}, CRect(0, 0, 2, 2)},            // shares the top-left corner only
     };
     for (const auto& c : cases) {
         ::ValidateRect(Scrollee(), nullptr);
@@ -319,7 +335,10 @@ TEST_F(DrawWndViewTest, ZoomedInRangeReachesTheMarginsBeyondDrawingAndView)
 {
     // Zoom-in amounts from the zero level; with an expansion the view is
     // wider than the drawing even after one level in.
-    const struct { int expansion; int amount; } cases[] = {{0, 5}, {0, 10}, {50, 1}};
+    const struct {
+        int expansion;
+        int amount;
+    } cases[] = {{0, 5}, {0, 10}, {50, 1}};
     for (const auto& c : cases) {
         Bind(c.expansion);
         Zoom(Tavo_GrZoom::In, c.amount);
@@ -344,10 +363,17 @@ TEST_F(DrawWndViewTest, ZoomAtAPixelKeepsTheWorldPointUnderIt)
 {
     // Client pixels; the first zoom from the zero level also brings the
     // scroll bars, which take rows and columns off the bottom and right.
-    const struct { Tavo_WiZoomCenter::Type centre; CPoint pixel; int amount; } cases[] = {
-        {Tavo_WiZoomCenter::AtPoint, CPoint(250, 200), 5},  {Tavo_WiZoomCenter::AtPoint, CPoint(100, 300), 3},
-        {Tavo_WiZoomCenter::AtPoint, CPoint(470, 20), 7},   {Tavo_WiZoomCenter::AtCursor, CPoint(400, 50), 5},
-        {Tavo_WiZoomCenter::AtCursor, CPoint(30, 360), 2},  {Tavo_WiZoomCenter::AtCursor, CPoint(0, 0), 10},
+    const struct {
+        Tavo_WiZoomCenter::Type centre;
+        CPoint pixel;
+        int amount;
+    } cases[] = {
+        {Tavo_WiZoomCenter::AtPoint, CPoint(250, 200), 5},
+        {Tavo_WiZoomCenter::AtPoint, CPoint(100, 300), 3},
+        {Tavo_WiZoomCenter::AtPoint, CPoint(470, 20), 7},
+        {Tavo_WiZoomCenter::AtCursor, CPoint(400, 50), 5},
+        {Tavo_WiZoomCenter::AtCursor, CPoint(30, 360), 2},
+        {Tavo_WiZoomCenter::AtCursor, CPoint(0, 0), 10},
     };
     for (const auto& c : cases) {
         Bind();
@@ -391,7 +417,10 @@ TEST_F(DrawWndViewTest, ZoomAtTheViewCentreCentresOnTheDrawingFirstAndOnTheViewT
 TEST_F(DrawWndViewTest, ZoomThatKeepsTheLevelTouchesNothingUnlessForced)
 {
     // At the zero level of a window whose largest level is 5.
-    const struct { Tavo_GrZoom::Type type; int amount; } unchanged[] = {
+    const struct {
+        Tavo_GrZoom::Type type;
+        int amount;
+    } unchanged[] = {
         {Tavo_GrZoom::Out, 1}, {Tavo_GrZoom::ZeroLevel, 1}, {Tavo_GrZoom::Keep, 1}, {Tavo_GrZoom::ToLevel, 0}};
     for (const auto& c : unchanged) {
         Wnd().SetDrawingInfo(&halves.drawing, 5, 3, 0, 0, 0);
@@ -488,11 +517,16 @@ TEST(DrawWndDeltas, WorldDeltasBecomeRoundedPixelsWithTheRestKeptAsErrorTerms)
     hosted.wnd.SetDrawingInfo(&drawing, 50, 3, 0, 0, 0);
     ASSERT_DOUBLE_EQ(hosted.wnd.GetMapping()->GetTransform().GetScale(), 1.5);
 
-    const struct { CPoint from, to; int scrolling; int dx, dy; double errorX, errorY; } cases[] = {
-        {CPoint(3, 0), CPoint(0, 0), 1, 5, 0, 0.5, 0.0},    // 4.5 rounds away from zero
-        {CPoint(3, 0), CPoint(0, 0), 0, 5, 0, 0.5, 0.0},    // measuring keeps the error terms
+    const struct {
+        CPoint from, to;
+        int scrolling;
+        int dx, dy;
+        double errorX, errorY;
+    } cases[] = {
+        {CPoint(3, 0), CPoint(0, 0), 1, 5, 0, 0.5, 0.0}, // 4.5 rounds away from zero
+        {CPoint(3, 0), CPoint(0, 0), 0, 5, 0, 0.5, 0.0}, // measuring keeps the error terms
         {CPoint(0, 0), CPoint(3, 3), 1, -5, -5, 0.0, -0.5},
-        {CPoint(10, 12), CPoint(8, 10), 1, 3, 3, 0.0, -0.5},  // whole pixels add nothing
+        {CPoint(10, 12), CPoint(8, 10), 1, 3, 3, 0.0, -0.5}, // whole pixels add nothing
         {CPoint(0, 1), CPoint(0, 0), 1, 0, 2, 0.0, 0.0},
     };
     for (const auto& c : cases) {
@@ -516,9 +550,11 @@ TEST(DrawWndDeltas, DeviceDeltasScrollByRoundedWorldUnitsAndAtLeastOne)
     PaintNow(hosted.Scrollee());
     ASSERT_DOUBLE_EQ(hosted.wnd.GetMapping()->GetTransform().GetScale(), 10.0);
 
-    const struct { int dx, dy; CPoint moved; } cases[] = {
-        {1, 0, CPoint(1, 0)}, {0, 5, CPoint(0, 1)},  {-1, 0, CPoint(-1, 0)}, {25, 0, CPoint(3, 0)},
-        {0, -14, CPoint(0, -1)}, {0, 0, CPoint(0, 0)}, {-15, 30, CPoint(-2, 3)}};
+    const struct {
+        int dx, dy;
+        CPoint moved;
+    } cases[] = {
+        {1, 0, CPoint(1, 0)}, {0, 5, CPoint(0, 1)}, {-1, 0, CPoint(-1, 0)}, {25, 0, CPoint(3, 0)}, {0, -14, CPoint(0, -1)}, {0, 0, CPoint(0, 0)}, {-15, 30, CPoint(-2, 3)}};
     for (const auto& c : cases) {
         const CPoint before = hosted.wnd.GetScrollPosition();
         hosted.wnd.ScrollWindowByDeviceDeltas(c.dx, c.dy);
@@ -535,13 +571,14 @@ TEST_F(DrawWndViewTest, ScrollByTheBarRepaintsOnlyTheUncoveredStripAsAFullRepain
     // so that every step leaves a rounding error behind.
     Zoom(Tavo_GrZoom::In, 3);
     const HWND drawWnd = Wnd().GetSafeHwnd();
-    const struct { UINT message; UINT code; } steps[] = {
-        {WM_HSCROLL, SB_LINERIGHT}, {WM_HSCROLL, SB_LINERIGHT}, {WM_VSCROLL, SB_LINEDOWN}, {WM_HSCROLL, SB_LINELEFT},
-        {WM_VSCROLL, SB_PAGEUP},    {WM_VSCROLL, SB_LINEDOWN},  {WM_HSCROLL, SB_PAGERIGHT}};
+    const struct {
+        UINT message;
+        UINT code;
+    } steps[] = {
+        {WM_HSCROLL, SB_LINERIGHT}, {WM_HSCROLL, SB_LINERIGHT}, {WM_VSCROLL, SB_LINEDOWN}, {WM_HSCROLL, SB_LINELEFT}, {WM_VSCROLL, SB_PAGEUP}, {WM_VSCROLL, SB_LINEDOWN}, {WM_HSCROLL, SB_PAGERIGHT}};
     for (const auto& step : steps) {
         const CPoint before = Wnd().GetScrollPosition();
-        const HWND bar = ::GetDlgItem(drawWnd, step.message == WM_HSCROLL ? Tavo_WiScrollWnd::HorzBarId
-                                                                             : Tavo_WiScrollWnd::VertBarId);
+        const HWND bar = ::GetDlgItem(drawWnd, step.message == WM_HSCROLL ? Tavo_WiScrollWnd::HorzBarId : Tavo_WiScrollWnd::VertBarId);
         ::SendMessageA(drawWnd, step.message, MAKEWPARAM(step.code, 0), reinterpret_cast<LPARAM>(bar));
         ::SendMessageA(drawWnd, step.message, MAKEWPARAM(SB_ENDSCROLL, 0), reinterpret_cast<LPARAM>(bar));
         const CPoint after = Wnd().GetScrollPosition();
@@ -553,10 +590,10 @@ TEST_F(DrawWndViewTest, ScrollByTheBarRepaintsOnlyTheUncoveredStripAsAFullRepain
         const CSize size = hosted.ScrolleeSize();
         const int dx = Tavo_GrRound(std::fabs(moved.x * Scale()));
         const int dy = Tavo_GrRound(std::fabs(moved.y * Scale()));
-        const CRect strip = moved.x > 0   ? CRect(size.cx - dx, 0, size.cx, size.cy)
-                            : moved.x < 0 ? CRect(0, 0, dx, size.cy)
-                            : moved.y > 0 ? CRect(0, 0, size.cx, dy)
-                                          : CRect(0, size.cy - dy, size.cx, size.cy);
+        const CRect strip = moved.x > 0 ? CRect(size.cx - dx, 0, size.cx, size.cy)
+            : moved.x < 0               ? CRect(0, 0, dx, size.cy)
+            : moved.y > 0               ? CRect(0, 0, size.cx, dy)
+                                        : CRect(0, size.cy - dy, size.cx, size.cy);
         EXPECT_EQ(PendingUpdate(Scrollee()), strip) << step.code;
         const int paints = Wnd().paints;
         PaintNow(Scrollee());
@@ -622,7 +659,10 @@ TEST_F(DrawWndViewTest, LiveResizeChangesTheViewOnlyAtItsEndAndOnlyForANewSize)
 {
     const CSize start(500, 400);
     const CSize other(400, 300);
-    const struct { int zoomIn; CSize end; } cases[] = {{0, start}, {5, start}, {0, other}, {5, other}};
+    const struct {
+        int zoomIn;
+        CSize end;
+    } cases[] = {{0, start}, {5, start}, {0, other}, {5, other}};
     for (const auto& c : cases) {
         ::SetWindowPos(Wnd().GetSafeHwnd(), nullptr, 0, 0, start.cx, start.cy, SWP_NOZORDER | SWP_NOMOVE);
         Bind();
@@ -755,4 +795,4 @@ TEST_F(DrawWndViewTest, EmptyOrHugeDrawingKeepsASoundViewAtEveryLevel)
     }
 }
 
-}  // namespace
+} // namespace

@@ -22,8 +22,7 @@ struct ScrollEvent {
     CScrollBar* bar;
 };
 
-class CScrollParentWnd : public CWnd
-{
+class CScrollParentWnd : public CWnd {
 public:
     std::vector<ScrollEvent> m_events;
 
@@ -44,8 +43,7 @@ BEGIN_MESSAGE_MAP(CScrollParentWnd, CWnd)
     ON_WM_VSCROLL()
 END_MESSAGE_MAP()
 
-class ControlsTest : public framework_test::WindowTest
-{
+class ControlsTest : public framework_test::WindowTest {
 protected:
     void SetUp() override
     {
@@ -54,7 +52,7 @@ protected:
     CScrollParentWnd m_parent;
 };
 
-}  // namespace
+} // namespace
 
 TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
 {
@@ -70,7 +68,7 @@ TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
     page.fMask = SIF_PAGE;
     page.nPage = 100;
     EXPECT_TRUE(vertical.SetScrollInfo(&page));
-    EXPECT_EQ(32767 - 99, vertical.GetScrollLimit());  // the last position that still shows a full page
+    EXPECT_EQ(32767 - 99, vertical.GetScrollLimit()); // the last position that still shows a full page
     vertical.SetScrollPos(500);
     EXPECT_EQ(500, vertical.GetScrollPos());
     m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(vertical.m_hWnd));
@@ -84,7 +82,7 @@ TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
     ASSERT_TRUE(horizontal.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(20, 0, 120, 16), &m_parent, kBarId + 1));
     horizontal.SetScrollRange(0, 100);
     m_parent.m_events.clear();
-    horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);  // the control itself reports to its parent
+    horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0); // the control itself reports to its parent
     ASSERT_FALSE(m_parent.m_events.empty());
     EXPECT_EQ(static_cast<UINT>(WM_HSCROLL), m_parent.m_events.front().message);
     EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_events.front().code);

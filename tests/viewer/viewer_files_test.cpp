@@ -42,7 +42,10 @@ TEST(OpenDrawing, RefusesWhatItCannotShowAndSaysWhy)
     ::GetTempPathA(sizeof folder, folder);
     const TempFile text("viewer-test-notes.dxf", "these are not\ngroup codes\n");
     const TempFile cut("viewer-test-cut.dxf", "0\nSECTION\n2\nENTITIES\n0\nLINE\n8\n0\n10\n");
-    const struct { std::string path; std::string startOfError; } rows[] = {
+    const struct {
+        std::string path;
+        std::string startOfError;
+    } rows[] = {
         {"", "No file name was given."},
         {std::string(folder) + "viewer-test-missing.dxf", "Cannot open viewer-test-missing.dxf: there is no such file."},
         {folder, "Cannot open " + std::string(folder) + ": access is denied"},
@@ -141,8 +144,7 @@ TEST_F(ViewerFixture, ExportWritesWhatTheViewShowsAsAPng)
 }
 
 // Answers the print dialog the way a person would, once it has opened.
-class DialogAnswer
-{
+class DialogAnswer {
 public:
     explicit DialogAnswer(std::function<void(HWND)> answer)
         : m_hook(::SetWindowsHookExA(WH_CALLWNDPROCRET, AfterMessage, nullptr, ::GetCurrentThreadId()))
@@ -199,10 +201,7 @@ TEST_F(ViewerFixture, CtrlPPrintsEveryPageOfTheGridThroughTheDialogOrNothingWhen
     const Tavo_WiPrintLayout& layout = View().GetPrintLayout();
     ASSERT_GT(layout.m_numCols * layout.m_numRows, 1);
     const int pages = layout.m_numCols * layout.m_numRows;
-    EXPECT_EQ(Status(ViewerStatusBar::Message), "Printed " + std::to_string(pages) + " pages of the " +
-                                                    std::to_string(layout.m_numCols) + " x " +
-                                                    std::to_string(layout.m_numRows) + " page grid to " +
-                                                    job.Path() + ".");
+    EXPECT_EQ(Status(ViewerStatusBar::Message), "Printed " + std::to_string(pages) + " pages of the " + std::to_string(layout.m_numCols) + " x " + std::to_string(layout.m_numRows) + " page grid to " + job.Path() + ".");
     const std::string postscript = ReadFile(job.Path());
     EXPECT_EQ(postscript.rfind("%!PS", 0), 0u);
     size_t pageMarks = 0;
@@ -211,4 +210,4 @@ TEST_F(ViewerFixture, CtrlPPrintsEveryPageOfTheGridThroughTheDialogOrNothingWhen
     EXPECT_EQ(pageMarks, static_cast<size_t>(pages));
 }
 
-}  // namespace
+} // namespace

@@ -11,15 +11,19 @@ namespace {
 
 TEST_F(ViewerFixture, KeysZoomAtTheViewCentreFitAndUndoTheLastZoomAsAToggle)
 {
-    const struct { WORD key; WORD modifier; double level; } presses[] = {
-        {VK_OEM_PLUS, 0, 2.0},        // '=' / '+' on the main keys
-        {VK_ADD, 0, 4.0},             // the number pad's +
+    const struct {
+        WORD key;
+        WORD modifier;
+        double level;
+    } presses[] = {
+        {VK_OEM_PLUS, 0, 2.0}, // '=' / '+' on the main keys
+        {VK_ADD, 0, 4.0},      // the number pad's +
         {VK_OEM_PLUS, VK_SHIFT, 6.0},
         {VK_OEM_MINUS, 0, 4.0},
         {VK_SUBTRACT, 0, 2.0},
         {VK_HOME, 0, 0.0},
-        {VK_BACK, 0, 2.0},            // back to the view before Home
-        {VK_BACK, 0, 0.0},            // and forth again
+        {VK_BACK, 0, 2.0}, // back to the view before Home
+        {VK_BACK, 0, 0.0}, // and forth again
     };
     const Tavo_GrWPoint centre{500, 400};
     for (const auto& press : presses) {
@@ -48,9 +52,16 @@ TEST_F(ViewerFixture, ArrowsScrollALineAndPageKeysAPageWhileZoomedIn)
     const CSize line(view.cx / 10, view.cy / 10);
     const CSize page(view.cx / 2, view.cy / 2);
     // World y grows upwards: scrolling down lowers the top edge's y.
-    const struct { WORD key; CSize step; } presses[] = {
-        {VK_RIGHT, CSize(line.cx, 0)},  {VK_LEFT, CSize(-line.cx, 0)}, {VK_DOWN, CSize(0, -line.cy)},
-        {VK_UP, CSize(0, line.cy)},     {VK_NEXT, CSize(0, -page.cy)}, {VK_PRIOR, CSize(0, page.cy)},
+    const struct {
+        WORD key;
+        CSize step;
+    } presses[] = {
+        {VK_RIGHT, CSize(line.cx, 0)},
+        {VK_LEFT, CSize(-line.cx, 0)},
+        {VK_DOWN, CSize(0, -line.cy)},
+        {VK_UP, CSize(0, line.cy)},
+        {VK_NEXT, CSize(0, -page.cy)},
+        {VK_PRIOR, CSize(0, page.cy)},
     };
     for (const auto& press : presses) {
         SCOPED_TRACE(testing::Message() << "key " << press.key);
@@ -108,4 +119,4 @@ TEST_F(ViewerFixture, ALiveResizeRederivesTheViewOnceWhenItEnds)
     EXPECT_EQ(view.bottom, bar.top);
 }
 
-}  // namespace
+} // namespace

@@ -28,9 +28,12 @@ bool Near(const Tavo_GrWPoint& a, const Tavo_GrWPoint& b, int units = 3)
 
 TEST_F(ViewerFixture, AClickNamesTheTopmostItemUnderThePointerInTheStatusBar)
 {
-    const struct { Tavo_GrWPoint at; const char* message; } rows[] = {
+    const struct {
+        Tavo_GrWPoint at;
+        const char* message;
+    } rows[] = {
         {{200, 200}, "Layer \"walls\": filled rectangle, 200 x 200"},
-        {{650, 500}, "Nothing here"},   // inside the hollow circle
+        {{650, 500}, "Nothing here"}, // inside the hollow circle
         {{750, 500}, "Layer \"pipes\": circle, 200 x 200"},
         {{600, 150}, "Layer \"pipes\": line, 500 x 0"},
         {{750, 720}, "Layer \"labels\": text \"valve\", 200 x 80"},
@@ -161,4 +164,4 @@ TEST_F(ViewerFixture, AfterARubberRectangleARestingPointerStillGetsADataTip)
     EXPECT_TRUE(View().GetScrollee()->GetDataTip()->IsVisible());
 }
 
-}  // namespace
+} // namespace

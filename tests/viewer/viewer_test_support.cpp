@@ -16,13 +16,12 @@ constexpr char Black = 0;
 
 // The application object (printer defaults) and the library, once for the
 // whole test program, as the viewer sets them up at start.
-struct Application
-{
+struct Application {
     Application() { Tavo_WiLibrary::Initialize(); }
     CWinApp app{"viewer test"};
 };
 
-}  // namespace
+} // namespace
 
 std::unique_ptr<ViewerDocument> MakeTestDocument()
 {
@@ -72,7 +71,10 @@ void ViewerFixture::SetUp()
 void ViewerFixture::TearDown()
 {
     // Nothing a failed case left pressed reaches the next one.
-    const struct { int key; DWORD up; } buttons[] = {{VK_LBUTTON, MOUSEEVENTF_LEFTUP}, {VK_RBUTTON, MOUSEEVENTF_RIGHTUP}};
+    const struct {
+        int key;
+        DWORD up;
+    } buttons[] = {{VK_LBUTTON, MOUSEEVENTF_LEFTUP}, {VK_RBUTTON, MOUSEEVENTF_RIGHTUP}};
     for (const auto& button : buttons)
         if (::GetAsyncKeyState(button.key) & 0x8000)
             Mouse(button.up, {FrameX + 5, FrameY + 5}, 1990);
@@ -143,7 +145,7 @@ INPUT KeyInput(WORD virtualKey, DWORD flags)
     return input;
 }
 
-}  // namespace
+} // namespace
 
 void ViewerFixture::KeyDown(WORD virtualKey)
 {
@@ -196,4 +198,4 @@ void ViewerFixture::FireParkTimer()
     ScrollTest::PumpPending();
 }
 
-}  // namespace ViewerTest
+} // namespace ViewerTest

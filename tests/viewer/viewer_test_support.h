@@ -24,8 +24,7 @@ namespace ViewerTest {
 std::unique_ptr<ViewerDocument> MakeTestDocument();
 
 // A file in the system's temporary folder, deleted when the object goes.
-class TempFile
-{
+class TempFile {
 public:
     TempFile(const std::string& name, const std::string& content);
     ~TempFile();
@@ -39,8 +38,7 @@ private:
 
 // A viewer frame at a fixed place on the screen, active, showing the test
 // document. Each test gets a new one.
-class ViewerFixture : public ::testing::Test
-{
+class ViewerFixture : public ::testing::Test {
 protected:
     static constexpr int FrameX = 60;
     static constexpr int FrameY = 40;
@@ -79,4 +77,4 @@ protected:
     DWORD base = 0;
 };
 
-}  // namespace ViewerTest
+} // namespace ViewerTest

@@ -16,8 +16,18 @@ namespace {
 
 TEST(DrawingUnitsText, PositionsAreWrittenToTheScreenPixelAndNeverAsMinusZero)
 {
-    const struct { double pixelsPerUnit; int decimals; } rows[] = {
-        {0.01, 0}, {1.0, 0}, {1.5, 1}, {10.0, 1}, {10.5, 2}, {3.7e5, 6}, {1e300, 6}, {-2.0, 0},
+    const struct {
+        double pixelsPerUnit;
+        int decimals;
+    } rows[] = {
+        {0.01, 0},
+        {1.0, 0},
+        {1.5, 1},
+        {10.0, 1},
+        {10.5, 2},
+        {3.7e5, 6},
+        {1e300, 6},
+        {-2.0, 0},
     };
     for (const auto& row : rows)
         EXPECT_EQ(DrawingUnitsText::DecimalsForPixel(row.pixelsPerUnit), row.decimals) << row.pixelsPerUnit;
@@ -38,9 +48,16 @@ TEST(DrawingUnitsText, PositionsAreWrittenToTheScreenPixelAndNeverAsMinusZero)
 
 TEST(StatusText, ZoomNamesTheLevelAndTheMagnificationOfTheFittedDrawing)
 {
-    const struct { double level; const char* text; } rows[] = {
-        {0.0, "Zoom level 0 (1x)"},        {5.0, "Zoom level 5 (2x)"},     {2.0, "Zoom level 2 (1.32x)"},
-        {7.5, "Zoom level 7.5 (2.83x)"},   {6.02, "Zoom level 6 (2.3x)"},  {60.0, "Zoom level 60 (4096x)"},
+    const struct {
+        double level;
+        const char* text;
+    } rows[] = {
+        {0.0, "Zoom level 0 (1x)"},
+        {5.0, "Zoom level 5 (2x)"},
+        {2.0, "Zoom level 2 (1.32x)"},
+        {7.5, "Zoom level 7.5 (2.83x)"},
+        {6.02, "Zoom level 6 (2.3x)"},
+        {60.0, "Zoom level 60 (4096x)"},
     };
     for (const auto& row : rows)
         EXPECT_EQ(StatusText::Zoom(row.level, 5), row.text);
@@ -82,7 +99,12 @@ TEST(ViewerStatusBar, APartHoldsAtMostItsLongestTextAndSaysWhereItWasCut)
 
 TEST(ViewerOptions, TheCommandLineNamesAFileOrATourAndRefusesTheRest)
 {
-    const struct { std::vector<const char*> arguments; bool ok; const char* file; const char* tour; } rows[] = {
+    const struct {
+        std::vector<const char*> arguments;
+        bool ok;
+        const char* file;
+        const char* tour;
+    } rows[] = {
         {{}, true, "", ""},
         {{"plan.dxf"}, true, "plan.dxf", ""},
         {{"--tour", "out", "plan.dxf"}, true, "plan.dxf", "out"},
@@ -113,4 +135,4 @@ TEST(ViewerOptions, TheCommandLineNamesAFileOrATourAndRefusesTheRest)
     EXPECT_TRUE(ParseViewerOptions(2, argv, help, error) && help.help);
 }
 
-}  // namespace
+} // namespace

@@ -42,7 +42,7 @@ void DrawPointer(DibCanvas& canvas, const RECT& area)
                  nullptr, DI_NORMAL);
 }
 
-}  // namespace
+} // namespace
 
 std::string SavePng(const RECT& area, const std::string& path)
 {
@@ -96,4 +96,4 @@ bool FindDrawnPoint(HWND window, POINT target, COLORREF background, POINT& found
     return false;
 }
 
-}  // namespace ScreenCapture
+} // namespace ScreenCapture

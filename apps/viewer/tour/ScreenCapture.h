@@ -27,4 +27,4 @@ RECT Around(HWND first, HWND second);
 // window shows nothing else.
 bool FindDrawnPoint(HWND window, POINT target, COLORREF background, POINT& found);
 
-}  // namespace ScreenCapture
+} // namespace ScreenCapture

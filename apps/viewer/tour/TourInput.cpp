@@ -5,7 +5,7 @@ namespace {
 // One wheel notch, in the wheel message's units.
 constexpr int NotchDelta = WHEEL_DELTA;
 
-}  // namespace
+} // namespace
 
 DWORD TourInput::Stamp(DWORD later)
 {

@@ -8,8 +8,7 @@
 
 #include <string>
 
-class TourInput
-{
+class TourInput {
 public:
     // The pointer to a screen point.
     void MoveTo(POINT screen);

@@ -4,7 +4,6 @@
 
 #include <commctrl.h>
 
-
 namespace TourWatch {
 
 namespace {
@@ -25,7 +24,7 @@ LRESULT SendWithin(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
     return static_cast<LRESULT>(answer);
 }
 
-}  // namespace
+} // namespace
 
 bool WaitFor(const std::function<bool()>& condition, DWORD timeoutMs)
 {
@@ -101,4 +100,4 @@ void Settle(HWND frame, HWND extra, bool repaint)
     ::Sleep(ScreenFlushMs);
 }
 
-}  // namespace TourWatch
+} // namespace TourWatch

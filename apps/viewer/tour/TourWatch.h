@@ -34,4 +34,4 @@ POINT CentreOf(HWND window);
 // pop-up; may be null) that waited for a paint.
 void Settle(HWND frame, HWND extra, bool repaint);
 
-}  // namespace TourWatch
+} // namespace TourWatch

@@ -41,7 +41,7 @@ POINT Between(POINT a, POINT b, int step, int steps)
     return {a.x + (b.x - a.x) * step / steps, a.y + (b.y - a.y) * step / steps};
 }
 
-}  // namespace
+} // namespace
 
 ViewerTour::ViewerTour(ViewerFrame& frame, std::string folder, std::string file)
     : m_frame(frame), m_folder(std::move(folder)), m_file(std::move(file))
@@ -72,7 +72,10 @@ void ViewerTour::Start()
 
 void ViewerTour::Run()
 {
-    const struct { const char* name; bool (ViewerTour::*step)(); } steps[] = {
+    const struct {
+        const char* name;
+        bool (ViewerTour::*step)();
+    } steps[] = {
         {"start", &ViewerTour::ShowStart},
         {"File > Open", &ViewerTour::Open},
         {"click", &ViewerTour::Click},

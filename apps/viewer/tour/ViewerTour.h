@@ -23,8 +23,7 @@
 
 class ViewerFrame;
 
-class ViewerTour
-{
+class ViewerTour {
 public:
     // frame: not owned, created; folder and file: Windows paths.
     ViewerTour(ViewerFrame& frame, std::string folder, std::string file);
@@ -40,8 +39,7 @@ public:
     int Finish();
 
 private:
-    struct Picture
-    {
+    struct Picture {
         std::string file;
         std::string caption;
     };
