@@ -28,8 +28,16 @@ public:
 
 private:
     enum Code : std::uint8_t {
-        PolyPolylineOp, PolygonOp, RectangleOp, EllipseOp, SelectCreatedOp, SelectOtherOp,
-        CreatePenOp, CreateBrushOp, DeleteCreatedOp, SetTextColorOp,
+        PolyPolylineOp,
+        PolygonOp,
+        RectangleOp,
+        EllipseOp,
+        SelectCreatedOp,
+        SelectOtherOp,
+        CreatePenOp,
+        CreateBrushOp,
+        DeleteCreatedOp,
+        SetTextColorOp,
     };
     struct Op {
         Code code = PolyPolylineOp;

@@ -32,11 +32,16 @@ int ClampY(int y) { return y < 1 ? 1 : (y > kBenchHeight ? kBenchHeight : y); }
 BenchPrimitive::Kind PickKind(Random& random)
 {
     const int roll = random.Below(100);
-    if (roll < 20) return BenchPrimitive::Dot;
-    if (roll < 45) return BenchPrimitive::Line;
-    if (roll < 55) return BenchPrimitive::Polyline;
-    if (roll < 70) return BenchPrimitive::Rect;
-    if (roll < 85) return BenchPrimitive::Circle;
+    if (roll < 20)
+        return BenchPrimitive::Dot;
+    if (roll < 45)
+        return BenchPrimitive::Line;
+    if (roll < 55)
+        return BenchPrimitive::Polyline;
+    if (roll < 70)
+        return BenchPrimitive::Rect;
+    if (roll < 85)
+        return BenchPrimitive::Circle;
     return BenchPrimitive::Triangle;
 }
 

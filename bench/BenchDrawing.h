@@ -11,13 +11,20 @@ class Tavo_GrDrawing;
 class Tavo_GrTransform;
 
 struct BenchPrimitive {
-    enum Kind : std::uint8_t { Dot, Line, Polyline, Rect, Circle, Triangle };
+    enum Kind : std::uint8_t {
+        Dot,
+        Line,
+        Polyline,
+        Rect,
+        Circle,
+        Triangle
+    };
     Kind kind = Dot;
     char colour = 0;
     char fill = 0;
     std::uint8_t pointCount = 0; // points used in `points` (polylines up to 5)
     int radius = 0;
-    int points[5][2] = {};       // world coordinates
+    int points[5][2] = {}; // world coordinates
 };
 
 constexpr int kBenchWidth = 1920;

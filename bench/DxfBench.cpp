@@ -177,8 +177,7 @@ Tavo_GrWPoint BusiestPoint(const DibCanvas& canvas, const Tavo_GrMapping& mappin
         for (int column = 0; column < kGridCells; ++column) {
             const int left = column * cellWidth;
             const int top = row * cellHeight;
-            const int drawn = cellWidth * cellHeight
-                            - canvas.CountPixels(RGB(255, 255, 255), left, top, left + cellWidth, top + cellHeight);
+            const int drawn = cellWidth * cellHeight - canvas.CountPixels(RGB(255, 255, 255), left, top, left + cellWidth, top + cellHeight);
             if (drawn > best) {
                 best = drawn;
                 bestColumn = column;

@@ -4,13 +4,21 @@
 // 1920 x 1080 DIB section, several runs of each of:
 //   (a) the surface, through the graphics core's Draw;
 //   (b) hand-written GDI, one call per primitive (PerPrimitiveRenderer);
-//   (c) the batched GDI calls that (a) makes, replayed directly from arrays.
-// It prints primitives per second for each, the time ratios a/c (the surface's
-// cost over the floor) and b/a (how much slower the naive way is), minimum and
-// median over the runs, and the heap allocations of each pass of (a).
+//   (c) the batched GDI calls that (a) makes, replayed directly from arrays;
+//   (d) a peer surface through the same Draw, one GDI call per primitive with
+//       pens and brushes cached per colour (CachedPenSurface).
+// The runs are made twice: on a thread without windows, and on a thread that
+// owns a (hidden) window, as every drawing window paints; there asking the
+// keyboard costs far more. It prints primitives per second for each, the time
+// ratios a/c (the surface's cost over the floor), b/a (how much slower the
+// naive way is) and a/d (the surface against the cached-pen peer), minimum and
+// median over the runs, the key-state queries and the heap allocations of each
+// pass of (a).
 #include "BatchedCallLog.h"
 #include "BenchDrawing.h"
+#include "CachedPenSurface.h"
 #include "DibCanvas.h"
+#include "EscapePollRedirect.h"
 #include "HeapCounter.h"
 #include "PerPrimitiveRenderer.h"
 
@@ -80,17 +88,6 @@ double TimePass(DibCanvas& canvas, Pass pass)
     return watch.Seconds();
 }
 
-// FNV-1a over the pixels: equal pictures give equal sums.
-std::uint64_t PictureSum(const DibCanvas& canvas)
-{
-    GdiFlush();
-    std::uint64_t sum = 1469598103934665603ull;
-    const size_t total = static_cast<size_t>(canvas.GetWidth()) * canvas.GetHeight();
-    for (size_t i = 0; i < total; ++i)
-        sum = (sum ^ (canvas.GetBits()[i] & 0xFFFFFF)) * 1099511628211ull;
-    return sum;
-}
-
 double Median(std::vector<double> values)
 {
     std::sort(values.begin(), values.end());
@@ -102,6 +99,118 @@ double Minimum(const std::vector<double>& values)
 {
     return *std::min_element(values.begin(), values.end());
 }
+
+// The share of pixels in which two pictures differ, in per cent.
+double DifferingPercent(const std::vector<std::uint32_t>& picture, const DibCanvas& canvas)
+{
+    GdiFlush();
+    size_t differing = 0;
+    for (size_t i = 0; i < picture.size(); ++i)
+        differing += (picture[i] & 0xFFFFFF) != (canvas.GetBits()[i] & 0xFFFFFF);
+    return 100.0 * static_cast<double>(differing) / static_cast<double>(picture.size());
+}
+
+// Everything a run draws with, built once.
+struct Bench {
+    const std::vector<BenchPrimitive>& primitives;
+    const Tavo_GrDrawing& drawing;
+    const Tavo_GrMapping& mapping;
+    DibCanvas& canvas;
+    Tavo_WiWin32Surface& surface;
+    CachedPenSurface& peer;
+    const BatchedCallLog& log;
+    HeapCounter& heap;
+    EscapePollRedirect& keys;
+    double items;
+};
+
+// Runs the four passes `runs` times, interleaved, and prints what they took.
+void RunSeries(const char* title, Bench& bench, int runs)
+{
+    std::vector<double> timeA, timeB, timeC, timeD, ratioAC, ratioBA, ratioAD, keyQueries;
+    std::vector<long long> allocations;
+    for (std::vector<double>* values : {&timeA, &timeB, &timeC, &timeD, &ratioAC, &ratioBA, &ratioAD, &keyQueries})
+        values->reserve(static_cast<size_t>(runs));
+    allocations.reserve(static_cast<size_t>(runs)); // nothing the timed passes count
+    const Tavo_GrTransform& transform = bench.mapping.GetTransform();
+    const auto surfacePass = [&] {
+        const long long heapBefore = bench.heap.GetCount();
+        const long long keysBefore = bench.keys.GetKeyQueryCount();
+        bench.surface.SetDC(bench.canvas.GetDC());
+        bench.drawing.Draw(bench.surface, bench.mapping, nullptr);
+        allocations.push_back(bench.heap.GetCount() - heapBefore);
+        keyQueries.push_back(static_cast<double>(bench.keys.GetKeyQueryCount() - keysBefore));
+    };
+    const auto perPrimitivePass = [&] {
+        DrawPerPrimitive(bench.canvas.GetDC(), bench.primitives, transform, kBenchHeight);
+    };
+    const auto replayPass = [&] { bench.log.Replay(bench.canvas.GetDC()); };
+    const auto peerPass = [&] {
+        bench.peer.SetDC(bench.canvas.GetDC());
+        bench.drawing.Draw(bench.peer, bench.mapping, nullptr);
+    };
+
+    std::printf("\n%s\n", title);
+    std::printf(" run  (a) surface  (b) per-primitive  (c) batched floor  (d) cached pens"
+                "    a/c    b/a    a/d  key queries\n");
+    for (int run = 0; run < runs; ++run) {
+        const double a = TimePass(bench.canvas, surfacePass);
+        const double b = TimePass(bench.canvas, perPrimitivePass);
+        const double c = TimePass(bench.canvas, replayPass);
+        const double d = TimePass(bench.canvas, peerPass);
+        timeA.push_back(a);
+        timeB.push_back(b);
+        timeC.push_back(c);
+        timeD.push_back(d);
+        ratioAC.push_back(a / c);
+        ratioBA.push_back(b / a);
+        ratioAD.push_back(a / d);
+        std::printf(" %3d  %9.0f/s  %15.0f/s  %15.0f/s  %13.0f/s  %6.3f %6.3f %6.3f  %11.0f\n", run + 1,
+                    bench.items / a, bench.items / b, bench.items / c, bench.items / d, a / c, b / a, a / d,
+                    keyQueries.back());
+    }
+
+    std::printf("primitives per second (median of %d runs):\n", runs);
+    std::printf("  (a) surface through Draw                 %12.0f\n", bench.items / Median(timeA));
+    std::printf("  (b) per-primitive GDI                    %12.0f\n", bench.items / Median(timeB));
+    std::printf("  (c) batched GDI, precomputed             %12.0f\n", bench.items / Median(timeC));
+    std::printf("  (d) per-primitive surface, cached pens   %12.0f\n", bench.items / Median(timeD));
+    std::printf("time ratio a/c: min %.3f  median %.3f   (surface over the batched floor)\n", Minimum(ratioAC),
+                Median(ratioAC));
+    std::printf("time ratio b/a: min %.3f  median %.3f   (per-primitive GDI over the surface)\n", Minimum(ratioBA),
+                Median(ratioBA));
+    std::printf("time ratio a/d: min %.3f  median %.3f   (surface over the cached-pen peer)\n", Minimum(ratioAD),
+                Median(ratioAD));
+    std::printf("key-state queries in a pass of (a): min %.0f  median %.0f  max %.0f\n", Minimum(keyQueries),
+                Median(keyQueries), *std::max_element(keyQueries.begin(), keyQueries.end()));
+    if (bench.heap.IsActive()) {
+        std::printf("heap allocations in a pass of (a): at most %lld (%d modules watched)\n",
+                    *std::max_element(allocations.begin(), allocations.end()), bench.heap.GetModuleCount());
+    }
+}
+
+// A window that is never shown: once the thread owns it, the thread's
+// keyboard queries go the way a drawing window's do.
+class HiddenWindow {
+public:
+    HiddenWindow()
+        : m_window(CreateWindowExA(0, "STATIC", "render_bench", WS_OVERLAPPED, 0, 0, 100, 100, nullptr, nullptr,
+                                   GetModuleHandleA(nullptr), nullptr))
+    {
+    }
+    ~HiddenWindow()
+    {
+        if (m_window)
+            DestroyWindow(m_window);
+    }
+    HiddenWindow(const HiddenWindow&) = delete;
+    HiddenWindow& operator=(const HiddenWindow&) = delete;
+
+    bool IsValid() const { return m_window != nullptr; }
+
+private:
+    HWND m_window;
+};
 
 } // namespace
 
@@ -121,7 +230,6 @@ int main(int argc, char** argv)
     Tavo_GrMapping mapping(&drawing, kLevelsPerDoubling);
     mapping.SetDeviceWindowSize(kBenchWidth, kBenchHeight, true, nullptr);
     const Tavo_GrTransform& transform = mapping.GetTransform();
-    const double items = drawing.GetItemCount();
     std::printf("render_bench: %d items (with the frame) at %d x %d, scale %.3f\n", drawing.GetItemCount(),
                 kBenchWidth, kBenchHeight, transform.GetScale());
 
@@ -131,72 +239,73 @@ int main(int argc, char** argv)
         return 1;
     }
     Tavo_WiWin32Surface surface;
+    CachedPenSurface peer;
     const auto surfacePass = [&] {
         surface.SetDC(canvas.GetDC());
         drawing.Draw(surface, mapping, nullptr);
     };
 
-    // Heap allocations of every pass of (a), the first included.
+    // Heap allocations of the first pass of (a): building the drawing's index
+    // and the palette. Every later pass must allocate nothing.
     HeapCounter heap;
-    std::vector<long long> allocations;
-    const auto countedSurfacePass = [&] {
+    long long firstPassAllocations = 0;
+    TimePass(canvas, [&] {
         const long long before = heap.GetCount();
         surfacePass();
-        allocations.push_back(heap.GetCount() - before);
-    };
-    TimePass(canvas, countedSurfacePass);
+        firstPassAllocations = heap.GetCount() - before;
+    });
 
     BatchedCallLog log;
     if (!log.Record(surfacePass)) {
         std::fprintf(stderr, "render_bench: could not record the surface's GDI calls\n");
         return 1;
     }
-    surface.ResetStats();
     std::printf("render_bench: the surface makes %zu GDI calls per pass\n", log.GetCallCount());
+    if (heap.IsActive())
+        std::printf("render_bench: the first pass of (a) allocated %lld times\n", firstPassAllocations);
+    else
+        std::printf("render_bench: heap allocations not counted (no allocation import found)\n");
 
-    // The replay must draw exactly what the surface draws.
+    // The replay must draw exactly what the surface draws; the per-primitive
+    // ways draw the same shapes, a pixel here and there apart.
     TimePass(canvas, surfacePass);
-    const std::uint64_t surfacePicture = PictureSum(canvas);
+    GdiFlush();
+    const std::vector<std::uint32_t> surfacePicture(canvas.GetBits(),
+                                                    canvas.GetBits() + static_cast<size_t>(kBenchWidth) * kBenchHeight);
     TimePass(canvas, [&] { log.Replay(canvas.GetDC()); });
-    const bool replayMatches = PictureSum(canvas) == surfacePicture;
+    const bool replayMatches = DifferingPercent(surfacePicture, canvas) == 0.0;
     std::printf("render_bench: the replay draws %s picture as the surface\n", replayMatches ? "the same" : "A DIFFERENT");
+    TimePass(canvas, [&] { DrawPerPrimitive(canvas.GetDC(), primitives, transform, kBenchHeight); });
+    std::printf("render_bench: (b) differs from the surface in %.2f %% of the pixels\n",
+                DifferingPercent(surfacePicture, canvas));
+    TimePass(canvas, [&] {
+        peer.SetDC(canvas.GetDC());
+        drawing.Draw(peer, mapping, nullptr);
+    });
+    std::printf("render_bench: (d) differs from the surface in %.2f %% of the pixels\n",
+                DifferingPercent(surfacePicture, canvas));
 
-    std::vector<double> timeA, timeB, timeC, ratioAC, ratioBA;
-    std::printf("\n run   (a) surface    (b) per-primitive  (c) batched floor   a/c    b/a\n");
-    for (int run = 0; run < options.runs; ++run) {
-        const double a = TimePass(canvas, countedSurfacePass);
-        const double b = TimePass(canvas, [&] { DrawPerPrimitive(canvas.GetDC(), primitives, transform, kBenchHeight); });
-        const double c = TimePass(canvas, [&] { log.Replay(canvas.GetDC()); });
-        timeA.push_back(a);
-        timeB.push_back(b);
-        timeC.push_back(c);
-        ratioAC.push_back(a / c);
-        ratioBA.push_back(b / a);
-        std::printf(" %3d  %9.0f/s  %12.0f/s  %12.0f/s  %6.3f %6.3f\n", run + 1, items / a, items / b, items / c,
-                    a / c, b / a);
+    EscapePollRedirect keys;
+    if (!keys.IsActive()) {
+        std::fprintf(stderr, "render_bench: could not watch the surface's key-state queries\n");
+        return 1;
+    }
+    surface.ResetStats();
+    Bench bench{primitives, drawing, mapping, canvas, surface, peer, log, heap, keys,
+                static_cast<double>(drawing.GetItemCount())};
+    RunSeries("on a thread without windows:", bench, options.runs);
+    {
+        HiddenWindow window;
+        if (!window.IsValid()) {
+            std::fprintf(stderr, "render_bench: no hidden window\n");
+            return 1;
+        }
+        RunSeries("on a thread that owns a window (hidden), as a drawing window paints:", bench, options.runs);
     }
 
-    std::printf("\nprimitives per second (median of %d runs):\n", options.runs);
-    std::printf("  (a) surface through Draw        %12.0f\n", items / Median(timeA));
-    std::printf("  (b) per-primitive GDI           %12.0f\n", items / Median(timeB));
-    std::printf("  (c) batched GDI, precomputed    %12.0f\n", items / Median(timeC));
-    std::printf("time ratio a/c: min %.3f  median %.3f   (surface over the batched floor)\n", Minimum(ratioAC),
-                Median(ratioAC));
-    std::printf("time ratio b/a: min %.3f  median %.3f   (per-primitive GDI over the surface)\n", Minimum(ratioBA),
-                Median(ratioBA));
-    if (heap.IsActive()) {
-        long long later = 0;
-        for (size_t i = 1; i < allocations.size(); ++i)
-            later = std::max(later, allocations[i]);
-        std::printf("heap allocations in a pass of (a): first pass %lld, every later pass at most %lld"
-                    " (%d modules watched)\n",
-                    allocations.front(), later, heap.GetModuleCount());
-    } else {
-        std::printf("heap allocations: not counted (no allocation import found)\n");
-    }
     Tavo_GrSurfaceStats stats;
     surface.FetchStats(stats);
-    std::printf("surface statistics over the timed runs: %u attribute changes, %u dots, %u lines, %u rects, %u circles\n",
+    std::printf("\nsurface statistics over the timed runs: %u attribute changes, %u dots, %u lines, %u rects, %u circles\n",
                 stats.Get(Tavo_GrSurfaceStats::AttrChanges), stats.Get(Tavo_GrSurfaceStats::Dots),
                 stats.Get(Tavo_GrSurfaceStats::Lines),
                 stats.Get(Tavo_GrSurfaceStats::HollowRects) + stats.Get(Tavo_GrSurfaceStats::FilledRects),

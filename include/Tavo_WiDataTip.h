@@ -14,8 +14,7 @@
 
 #include <afxwin.h>
 
-class AFX_EXT_CLASS Tavo_WiDataTip : public CWnd
-{
+class AFX_EXT_CLASS Tavo_WiDataTip : public CWnd {
 public:
     // Timer id on the tip's window and its period in milliseconds; the tip's
     // anchor lies this far right of and below the pointer; margins around the
@@ -65,9 +64,9 @@ private:
     void StopTimer();
     void SendDataTipNotification();
 
-    CWnd* m_owner = nullptr;     // the owning window; not owned
-    CPoint m_position{-1, -1};   // anchor of the tip in screen coordinates
+    CWnd* m_owner = nullptr;   // the owning window; not owned
+    CPoint m_position{-1, -1}; // anchor of the tip in screen coordinates
     CString m_text;
-    UINT_PTR m_timerId = 0;      // id of the running timer, else 0
-    int m_visible = 0;           // also the wParam of every notification
+    UINT_PTR m_timerId = 0; // id of the running timer, else 0
+    int m_visible = 0;      // also the wParam of every notification
 };

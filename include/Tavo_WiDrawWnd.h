@@ -39,15 +39,13 @@
 
 struct CPrintInfo;
 
-class AFX_EXT_CLASS Tavo_WiDrawWnd : public Tavo_WiScrollWnd
-{
+class AFX_EXT_CLASS Tavo_WiDrawWnd : public Tavo_WiScrollWnd {
 public:
     // What a drag does (GetDragAction). Any other value: nothing.
-    enum DragAction
-    {
-        Pan = 0,                // moves the view with the pointer (only while zoomed in)
-        RubberRectangle = 1,    // DoRubberRectangle
-        DragAndDrop = 2         // DoDragAndDrop
+    enum DragAction {
+        Pan = 0,             // moves the view with the pointer (only while zoomed in)
+        RubberRectangle = 1, // DoRubberRectangle
+        DragAndDrop = 2      // DoDragAndDrop
     };
 
     // The autoscroll timer of a pan drag that has left the view: on this
@@ -136,9 +134,9 @@ public:
     // ---- binding and access -------------------------------------------------------
     // Binds a drawing (not owned) and shows it at the zero level, or unbinds
     // with null. The mapping gets the largest zoom level, the zero-level
-    // expansion (percent) and the largest-zoom world clip box size. When
-    // there is no memory for the mapping the window stays unbound
-    // (GetDrawing() gives null).
+    // expansion (percent) and the largest-zoom world clip box size. The view
+    // to undo goes with the old mapping. When there is no memory for the
+    // mapping the window stays unbound (GetDrawing() gives null).
     void SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, int surfaceOption,
                         int zeroLevelExpansion, unsigned int maxClipWidth,
                         unsigned int maxClipHeight);
@@ -163,13 +161,15 @@ public:
     // ---- zooming and panning ------------------------------------------------------
     // Zooms by type and amount about the pointer, the view centre or the device
     // point (x, y). Without force, a zoom that would not change the level does
-    // nothing.
+    // nothing. No zoom form does anything while the window has no client area
+    // (minimised or zero-sized).
     void ZoomWindow(Tavo_GrZoom::Type type, int amount, Tavo_WiZoomCenter::Type centre, int x, int y,
                     bool force);
     // Zooms to a (fractional) zoom level about the world point (x, y).
     void ZoomWindow(double level, int x, int y);
-    // Zooms so that a world rectangle fills the view; nothing for a rectangle
-    // of zero width or height.
+    // Zooms so that a world rectangle fills the view (the view that is left
+    // once the zoom has shown or hidden the scroll bars); nothing for a
+    // rectangle of zero width or height.
     void ZoomWindow(const Tavo_GrWRect& rect);
     // Whether ZoomWindow(type, amount, ...) would change the zoom level.
     bool ZoomWindowTest(Tavo_GrZoom::Type type, int amount) const;
@@ -207,9 +207,13 @@ protected:
 private:
     // Re-derives the scroll model (range, deltas, extent, position) from the
     // mapping after zooming it by type and amount about a device point (null:
-    // the view's centre, or the drawing's at the zero level). Invalidates the
+    // the view's centre, or the drawing's at the zero level), once more when
+    // laying out the scroll bars changed the scrollee's size. Invalidates the
     // scrollee when the view changed or force is set.
     void InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force);
+    // Sets the scroll range, deltas, extent and position from the mapping's
+    // view of a scrollee of the given size (the caller lays out).
+    void DeriveScrollModel(const Tavo_GrWRect& bounds, const CSize& size);
     // The pointer as a device point of the scrollee, unclipped; (0, 0) unbound.
     Tavo_GrDPoint GetCursorPositionInScrollee();
     // The scrollee's client size.
@@ -219,19 +223,19 @@ private:
     // The world rectangle the device rectangle (0, 0, width, height) shows.
     Tavo_GrWRect VisibleWorldRect(int width, int height) const;
 
-    Tavo_GrDrawing* m_drawing = nullptr;                 // not owned
-    std::unique_ptr<Tavo_GrMapping> m_mapping;           // exactly while a drawing is bound
-    int m_surfaceOption = 3;                             // copied into every on-screen surface
-    int m_panDirection = 1;                              // +1 or -1
+    Tavo_GrDrawing* m_drawing = nullptr;       // not owned
+    std::unique_ptr<Tavo_GrMapping> m_mapping; // exactly while a drawing is bound
+    int m_surfaceOption = 3;                   // copied into every on-screen surface
+    int m_panDirection = 1;                    // +1 or -1
     // During a pan drag: the scrollee's window size at its start and the
     // reference pointer position. During a live resize: the scrollee's client
     // size and the scroll position when it began.
     CSize m_savedSize{0, 0};
     CPoint m_savedPoint{0, 0};
-    Tavo_GrWRect m_undoClipBox;                          // the view before the last zoom
+    Tavo_GrWRect m_undoClipBox; // the view before the last zoom
     Tavo_WiPrintLayout m_printLayout;
-    UINT m_autoScrollTimerId = 0;                        // while the autoscroll timer runs
-    int m_sizing = 0;                                    // 1 during a live resize
-    int m_panDrag = 0;                                   // 1 during a pan drag
-    int m_zoomedIn = 1;                                  // after InternalZoom: L != 0
+    UINT m_autoScrollTimerId = 0; // while the autoscroll timer runs
+    int m_sizing = 0;             // 1 during a live resize
+    int m_panDrag = 0;            // 1 during a pan drag
+    int m_zoomedIn = 1;           // after InternalZoom: L != 0
 };

@@ -13,8 +13,7 @@
 
 #include <afxwin.h>
 
-class AFX_EXT_CLASS Tavo_WiParkedCursorMonitor : public CWnd
-{
+class AFX_EXT_CLASS Tavo_WiParkedCursorMonitor : public CWnd {
 public:
     // Park timer id on the monitor's window, the rest time in milliseconds,
     // and the control id under which a scrollee creates its monitor.
@@ -62,11 +61,11 @@ private:
     void SendParkedNotification(WPARAM parked);
     bool OwnerIsLive() const;
 
-    CWnd* m_owner = nullptr;      // the watched window; not owned
-    CPoint m_lastPoint{-1, -1};   // position of the last mouse move seen
-    CPoint m_parkPoint{-1, -1};   // where the current rest began, owner's client coordinates
-    UINT_PTR m_timerId = 0;       // id of the running park timer, else 0
+    CWnd* m_owner = nullptr;    // the watched window; not owned
+    CPoint m_lastPoint{-1, -1}; // position of the last mouse move seen
+    CPoint m_parkPoint{-1, -1}; // where the current rest began, owner's client coordinates
+    UINT_PTR m_timerId = 0;     // id of the running park timer, else 0
     int m_enabled = 1;
     int m_parked = 0;
-    int m_buttonDown = 0;         // 1 from a button press until its release or double click
+    int m_buttonDown = 0; // 1 from a button press until its release or double click
 };

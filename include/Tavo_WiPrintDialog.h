@@ -12,15 +12,14 @@
 
 #include "Tavo_WiPrintLayout.h"
 
-class AFX_EXT_CLASS Tavo_WiPrintDialog : public CPrintDialog
-{
+class AFX_EXT_CLASS Tavo_WiPrintDialog : public CPrintDialog {
 public:
     // Control ids of the standard print dialog template.
-    static constexpr int FirstPageBoxId = 1152;     // edt1
-    static constexpr int LastPageBoxId = 1153;      // edt2
-    static constexpr int AllPagesButtonId = 1056;   // rad1
+    static constexpr int FirstPageBoxId = 1152;      // edt1
+    static constexpr int LastPageBoxId = 1153;       // edt2
+    static constexpr int AllPagesButtonId = 1056;    // rad1
     static constexpr int CurrentPageButtonId = 1057; // rad2, the template's selection choice
-    static constexpr int PageRangeButtonId = 1058;  // rad3
+    static constexpr int PageRangeButtonId = 1058;   // rad3
 
     Tavo_WiPrintDialog(BOOL printSetupOnly, DWORD flags, CWnd* parent);
     virtual ~Tavo_WiPrintDialog();

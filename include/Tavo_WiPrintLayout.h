@@ -10,11 +10,10 @@
 
 #include "Tavo_GrTypes.h"
 
-struct Tavo_WiPrintLayout
-{
-    int m_numCols = 0;              // page columns of the grid
-    int m_numRows = 0;              // page rows of the grid
-    int m_currentPage = 0;          // the page that holds the top-left corner of the view
-    int m_page = 0;                 // the page being printed
-    Tavo_GrWRect m_firstPageBox;    // the world rectangle printed on page 1, the top-left page
+struct Tavo_WiPrintLayout {
+    int m_numCols = 0;           // page columns of the grid
+    int m_numRows = 0;           // page rows of the grid
+    int m_currentPage = 0;       // the page that holds the top-left corner of the view
+    int m_page = 0;              // the page being printed
+    Tavo_GrWRect m_firstPageBox; // the world rectangle printed on page 1, the top-left page
 };

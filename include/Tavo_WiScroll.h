@@ -11,8 +11,7 @@ constexpr int MaxBarRange = 32767;
 // Which bar a scroll moves, and which way: Left and Up go backwards (towards
 // the range minimum, or the range maximum for y in inverted-Y mode), Right and
 // Down forwards.
-enum Dir
-{
+enum Dir {
     Left = 0,
     Right = 1,
     Up = 2,
@@ -20,12 +19,11 @@ enum Dir
 };
 
 // How far a scroll goes.
-enum Amount
-{
-    Line = 0,     // one line delta
-    Page = 1,     // one page delta
-    Limit = 2,    // to the end of the range in that direction
-    Percent = 3   // a percentage of the window extent, given as the third argument
+enum Amount {
+    Line = 0,   // one line delta
+    Page = 1,   // one page delta
+    Limit = 2,  // to the end of the range in that direction
+    Percent = 3 // a percentage of the window extent, given as the third argument
 };
 
-}  // namespace Tavo_WiScroll
+} // namespace Tavo_WiScroll

@@ -22,8 +22,7 @@
 #include "Tavo_WiScroll.h"
 #include "Tavo_WiScrollee.h"
 
-class AFX_EXT_CLASS Tavo_WiScrollWnd : public CWnd
-{
+class AFX_EXT_CLASS Tavo_WiScrollWnd : public CWnd {
 public:
     // Control ids of the children.
     static constexpr UINT ScrolleeId = 1000;
@@ -143,29 +142,32 @@ private:
     void DecideBarVisibility(int clientWidth, int clientHeight);
     void BeginThumbDrag();
     void EndScrollAction();
-    enum class Axis { Horizontal, Vertical };
+    enum class Axis {
+        Horizontal,
+        Vertical
+    };
     // The scroll codes of either bar (OnHScroll, OnVScroll).
     void OnScroll(Axis axis, UINT code, UINT n, CScrollBar* bar);
     // Moves the position on one axis and reports the move of a drag scroll.
     void ScrollTo(Axis axis, int value);
 
-    double m_horzScale = 1.0;           // scroll units per horizontal bar unit, at least 1
+    double m_horzScale = 1.0; // scroll units per horizontal bar unit, at least 1
     double m_vertScale = 1.0;
-    CSize m_windowExtent{0, 0};         // the visible window, in scroll units
+    CSize m_windowExtent{0, 0}; // the visible window, in scroll units
     CSize m_lineDelta{1, 1};
     CSize m_pageDelta{10, 10};
     CPoint m_rangeMin{0, 100};
     CPoint m_rangeMax{0, 100};
-    CPoint m_position{0, 0};            // left edge (x) and top edge (y) of the window
+    CPoint m_position{0, 0}; // left edge (x) and top edge (y) of the window
     int m_invertedY = 0;
     int m_autoVisibility = 1;
     int m_horzBarVisible = 1;
     int m_vertBarVisible = 1;
     int m_dragScrolling = 0;
-    int m_testMode = 0;                 // 1 only inside ScrollWindowTest
+    int m_testMode = 0; // 1 only inside ScrollWindowTest
     Tavo_WiScrollee m_scrollee;
     CScrollBar m_horzBar;
     CScrollBar m_vertBar;
     CButton m_corner;
-    int m_moved = 0;                    // whether the last ScrollWindowTo changed the position
+    int m_moved = 0; // whether the last ScrollWindowTo changed the position
 };

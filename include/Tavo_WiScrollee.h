@@ -22,9 +22,8 @@ class Tavo_WiDataTip;
 class Tavo_WiParkedCursorMonitor;
 class Tavo_WiScrollWnd;
 
-class AFX_EXT_CLASS Tavo_WiScrollee : public CWnd
-{
-    friend class Tavo_WiScrollWnd;   // creates the scrollee through the private Create
+class AFX_EXT_CLASS Tavo_WiScrollee : public CWnd {
+    friend class Tavo_WiScrollWnd; // creates the scrollee through the private Create
 
 public:
     // The hold timer on the scrollee's window; a press held this long becomes
@@ -95,14 +94,14 @@ private:
 
     std::unique_ptr<Tavo_WiParkedCursorMonitor> m_monitor;
     std::unique_ptr<Tavo_WiDataTip> m_dataTip;
-    UINT m_pressedButton = 0;        // mouse-key flag of the followed press, 0 when none
-    UINT m_pressFlags = 0;           // key flags of the button-down message
-    UINT_PTR m_holdTimerId = 0;      // what SetTimer returned for the hold timer
+    UINT m_pressedButton = 0;   // mouse-key flag of the followed press, 0 when none
+    UINT m_pressFlags = 0;      // key flags of the button-down message
+    UINT_PTR m_holdTimerId = 0; // what SetTimer returned for the hold timer
     COLORREF m_backgroundColor = 0;
     int m_backgroundColorSet = 0;
-    int m_doubleClick = 0;           // 1 while the followed press is the second of a double click
+    int m_doubleClick = 0; // 1 while the followed press is the second of a double click
     int m_dragging = 0;
-    int m_capture = 0;               // 1 while the scrollee holds a capture it took itself
+    int m_capture = 0; // 1 while the scrollee holds a capture it took itself
     CPoint m_pressPoint{0, 0};
-    LONG m_pressTime = -1;           // message time of the followed press; 0 once a press ends
+    LONG m_pressTime = -1; // message time of the followed press; 0 once a press ends
 };

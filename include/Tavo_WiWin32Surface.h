@@ -11,6 +11,12 @@
 // One drawing pass: SetDC -> drawing operations -> Flush -> EndDrawing.
 // EndDrawing selects back what the surface displaced and deletes the GDI
 // objects it created; between passes the surface holds none.
+//
+// Holding Escape interrupts a pass. The surface polls before every batch it
+// emits (nine times per Flush) and the graphics core every so often; a poll
+// asks the keyboard at the first poll of a pass and then at most once per tick
+// of the system clock (GetTickCount64), answering from the interrupted flag in
+// between, so Escape is seen within one clock tick and one batch.
 #pragma once
 
 #include <afxwin.h>
@@ -64,6 +70,7 @@ public:
     void DrawTriangle(Tavo_GrDPoint points[3], Tavo_GrAttr* attr) override;
     void Flush() override;
     void OnAttrChange() override;
+    void BeginDrawing(const Tavo_GrDrawing* drawing) override;
     void EndDrawing() override;
     bool PollDrawInterrupt() override;
 
@@ -152,16 +159,25 @@ private:
     HGDIOBJ m_oldFont = nullptr;
 
     Tavo_GrSurfaceStats m_stats;
-    unsigned char m_textAlign = 5; // left, bottom: what SetDC selects
+    unsigned char m_textAlign = Tavo_GrAttr::AlignDefault; // left, bottom: what SetDC selects
     unsigned char m_color = kNoAttrCode;
     unsigned char m_fill = kNoAttrCode;
+    // The clock tick of the last Escape query of this pass.
+    ULONGLONG m_escapeQueryTick = kNoEscapeQuery;
 
-    // No dot added yet: no core position equals it in practice.
+    // The last-dot position before any dot was added: no core position
+    // equals it in practice.
     static constexpr int kNoDot = INT_MIN;
+    // The last-dot position once the dot batch has been emitted: one pixel
+    // beyond the device window's bottom-left corner, so a dot there (and only
+    // there) right after an emission counts as a repeat and is not drawn.
+    static constexpr int kNoDotSinceEmission = -1;
     // Smallest font height in pixels unless BRY_VWR_MINFONT says otherwise.
     static constexpr int kDefaultMinFont = 8;
     // Neither a colour nor a fill code: the first attribute change rebuilds all.
     static constexpr unsigned char kNoAttrCode = 157;
+    // No Escape query yet in this pass; the system clock never reads it.
+    static constexpr ULONGLONG kNoEscapeQuery = ~0ull;
 
     static int m_instanceCount;
     static std::unique_ptr<DWORD[]> m_2array;

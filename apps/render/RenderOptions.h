@@ -12,9 +12,9 @@ struct RenderOptions {
 
     int width = kDefaultWidth;
     int height = kDefaultHeight;
-    int zoom = 0;            // zoom level: 0 fits the whole drawing
+    int zoom = 0; // zoom level: 0 fits the whole drawing
     std::string output = "sample.png";
-    std::string dxf;         // a DXF file to draw instead of the sample drawing
+    std::string dxf; // a DXF file to draw instead of the sample drawing
     // When set: print the drawing's page grid to this PostScript file instead
     // of writing the PNG.
     std::string print;

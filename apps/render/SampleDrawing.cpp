@@ -10,13 +10,40 @@ namespace {
 
 // Built-in palette indices.
 enum Colour : char {
-    Black = 0, Blue = 1, Green = 2, Cyan = 3, Red = 4, Magenta = 5, Yellow = 6, White = 7,
-    Gray = 8, DarkGray = 9, DarkBlue = 10, DarkGreen = 11, DarkCyan = 12, DarkRed = 13,
-    DarkMagenta = 14, Olive = 15,
+    Black = 0,
+    Blue = 1,
+    Green = 2,
+    Cyan = 3,
+    Red = 4,
+    Magenta = 5,
+    Yellow = 6,
+    White = 7,
+    Gray = 8,
+    DarkGray = 9,
+    DarkBlue = 10,
+    DarkGreen = 11,
+    DarkCyan = 12,
+    DarkRed = 13,
+    DarkMagenta = 14,
+    Olive = 15,
 };
 const char* const kColourNames[16] = {
-    "black", "blue", "green", "cyan", "red", "magenta", "yellow", "white",
-    "gray", "dark_gray", "dark_blue", "dark_green", "dark_cyan", "dark_red", "dark_magenta", "olive",
+    "black",
+    "blue",
+    "green",
+    "cyan",
+    "red",
+    "magenta",
+    "yellow",
+    "white",
+    "gray",
+    "dark_gray",
+    "dark_blue",
+    "dark_green",
+    "dark_cyan",
+    "dark_red",
+    "dark_magenta",
+    "olive",
 };
 
 const char kHollow = 0;

@@ -23,8 +23,19 @@ namespace {
 const int kLevelsPerDoubling = 5;
 
 const char* const kCounterNames[Tavo_GrSurfaceStats::CounterCount] = {
-    "attribute changes", "dots", "polylines", "lines", "hollow triangles", "hollow rectangles",
-    "polygons", "filled triangles", "filled rectangles", "circles", "texts", "grids", "calls",
+    "attribute changes",
+    "dots",
+    "polylines",
+    "lines",
+    "hollow triangles",
+    "hollow rectangles",
+    "polygons",
+    "filled triangles",
+    "filled rectangles",
+    "circles",
+    "texts",
+    "grids",
+    "calls",
 };
 
 void PrintStats(const Tavo_GrSurfaceStats& stats)

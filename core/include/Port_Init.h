@@ -8,7 +8,13 @@
 
 #include "Tavo_CoreApi.h"
 
-enum class Port_Service { File, PathList, InstanceTable, Factory, MsgMan };
+enum class Port_Service {
+    File,
+    PathList,
+    InstanceTable,
+    Factory,
+    MsgMan
+};
 
 TAVO_CORE_API int Port_GetServiceUsers(Port_Service service);
 

@@ -25,6 +25,9 @@ public:
         AlignMiddle = 12,
         AlignDefault = AlignLeft | AlignBottom, // 5
     };
+    // The bits of an alignment code that hold its horizontal and its vertical part.
+    static constexpr char kHorizontalAlignMask = 3;
+    static constexpr char kVerticalAlignMask = 12;
 
     constexpr Tavo_GrAttr() = default;
     constexpr Tavo_GrAttr(char color, char fill, int charHeight = 0, char textAlign = AlignDefault)
@@ -45,8 +48,7 @@ public:
 
     bool operator==(const Tavo_GrAttr& other) const
     {
-        return m_color == other.m_color && m_fill == other.m_fill && m_charHeight == other.m_charHeight
-            && m_textAlign == other.m_textAlign;
+        return m_color == other.m_color && m_fill == other.m_fill && m_charHeight == other.m_charHeight && m_textAlign == other.m_textAlign;
     }
     bool operator!=(const Tavo_GrAttr& other) const { return !(*this == other); }
 

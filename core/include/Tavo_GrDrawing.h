@@ -1,6 +1,7 @@
 // Tavo_GrDrawing: a drawing of the graphics core, and how it is drawn.
 // Tavo_GrLayer:   a named group of a drawing's items, drawn in order.
 // Tavo_GrCall:    an item that places another drawing at an offset.
+// Tavo_GrItemKind, Tavo_GrItemInfo: what FindItems reports of an item.
 //
 // A drawing holds items of these kinds, each with its attribute (Tavo_GrAttr):
 // dot, line, polyline, polygon, rectangle, circle, triangle, text at a point,
@@ -40,13 +41,26 @@
 // a drawing that held text when the call was added is found by its bounds
 // widened by as much as the text of its layer may reach.
 //
-// A drawing is not thread-safe: draw it from one thread at a time.
+// FindItems(area, visitor) answers what lies under a world rectangle (a
+// pointer's aperture): it reports, in the order they are drawn, the items of
+// the visible layers whose shapes meet the area, touching counts. Lines,
+// polylines and the outlines of hollow shapes meet it where a segment or the
+// circle passes through it; filled shapes also with their inside; dots where
+// the point lies in it; texts and text boxes by their bounds (not by where a
+// surface may draw their text); a call when an item of the called drawing
+// meets the area moved back by the call's offset. The layers' spatial indexes
+// find the candidates, so a query costs about what a pass over the same area
+// costs.
+//
+// A drawing is not thread-safe: draw and query it from one thread at a time.
 #pragma once
 
 #include "Tavo_CoreApi.h"
 #include "Tavo_GrAttr.h"
 #include "Tavo_GrTypes.h"
 
+#include <cstdint>
+#include <functional>
 #include <memory>
 
 class Tavo_GrMapping;
@@ -54,6 +68,20 @@ class Tavo_GrSurface;
 class Tavo_GrDrawing;
 struct Tavo_GrDrawingData;
 struct Tavo_GrLayerData;
+
+// The kinds of items, in the terms of Tavo_GrDrawingBuilder's Add operations.
+enum class Tavo_GrItemKind : uint8_t {
+    Dot,
+    Line,
+    Polyline,
+    Polygon,
+    Rect,
+    Circle,
+    Triangle,
+    Text,
+    TextBox,
+    Call
+};
 
 class TAVO_CORE_API Tavo_GrCall {
 public:
@@ -100,6 +128,20 @@ private:
     std::unique_ptr<Tavo_GrLayerData> m_data;
 };
 
+// One item found by Tavo_GrDrawing::FindItems. The pointers stay valid while
+// the drawing lives and no layer is added to it.
+struct Tavo_GrItemInfo {
+    const Tavo_GrLayer* layer = nullptr; // the item's layer; not owned
+    int index = 0;                       // the item's place in its layer, from 0, in the order added
+    Tavo_GrItemKind kind = Tavo_GrItemKind::Dot;
+    Tavo_GrAttr attr;
+    Tavo_GrWRect bounds;        // the item's world bounds (see above)
+    const char* text = nullptr; // a text's or text box's text; null for other kinds
+};
+
+// Called with each item found; returning false stops the search.
+using Tavo_GrItemVisitor = std::function<bool(const Tavo_GrItemInfo&)>;
+
 class TAVO_CORE_API Tavo_GrDrawing {
 public:
     static constexpr int kClipMarginPixels = 4;
@@ -123,6 +165,13 @@ public:
     // Null for an index outside 0 ... GetLayerCount() - 1.
     const Tavo_GrLayer* GetLayer(int index) const;
     void SetLayerVisible(int index, bool visible);
+
+    // Reports to visitor every item of a visible layer whose shape meets area
+    // (world units; a rectangle with swapped corners counts as its normalised
+    // form), in drawing order, until the visitor returns false; returns how
+    // many items were reported. Nothing for a null visitor. A visitor must
+    // not add to the drawing.
+    int FindItems(const Tavo_GrWRect& area, const Tavo_GrItemVisitor& visitor) const;
 
 private:
     friend class Tavo_GrDrawingBuilder;

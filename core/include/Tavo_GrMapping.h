@@ -82,7 +82,7 @@ struct Tavo_GrZoom {
 class TAVO_CORE_API Tavo_GrMapping {
 public:
     static constexpr int kDefaultMaxZoomLevelsPerStep = 10; // default max level = 10 * n
-    static constexpr double kMaxScale = 2147483647.0;          // device pixels per world unit at most
+    static constexpr double kMaxScale = 2147483647.0;       // device pixels per world unit at most
 
     // drawing: shown, not owned (null: an empty drawing). levelsPerDoubling: n above.
     Tavo_GrMapping(const Tavo_GrDrawing* drawing, int levelsPerDoubling);

@@ -69,29 +69,29 @@ public:
     Tavo_GrSurface& operator=(const Tavo_GrSurface&) = delete;
 
     // ---- Overridables, in slot order --------------------------------------
-    virtual void DrawCall(const Tavo_GrCall* call);                                    // 0
-    virtual void DrawEHCall(const Tavo_GrCall* call);                                  // 1
-    virtual void DrawEHSignalCall(const Tavo_GrCall* call);                            // 2
-    virtual void DrawCircle(Tavo_GrDPoint& centre, int radius, Tavo_GrAttr* attr);     // 3
-    virtual void DrawDot(Tavo_GrDPoint& point, Tavo_GrAttr* attr);                     // 4
+    virtual void DrawCall(const Tavo_GrCall* call);                                // 0
+    virtual void DrawEHCall(const Tavo_GrCall* call);                              // 1
+    virtual void DrawEHSignalCall(const Tavo_GrCall* call);                        // 2
+    virtual void DrawCircle(Tavo_GrDPoint& centre, int radius, Tavo_GrAttr* attr); // 3
+    virtual void DrawDot(Tavo_GrDPoint& point, Tavo_GrAttr* attr);                 // 4
     virtual void DrawGrid(Tavo_GrDPoint& origin, Tavo_GrDPoint& step, Tavo_GrDPoint& extent,
-                          Tavo_GrAttr* attr);                                          // 5
-    virtual void DrawLine(Tavo_GrDPoint& from, Tavo_GrDPoint& to, Tavo_GrAttr* attr);  // 6
-    virtual void DrawPline(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr);       // 7
-    virtual void DrawPolygon(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr);     // 8
-    virtual void DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr);                      // 9
+                          Tavo_GrAttr* attr);                                         // 5
+    virtual void DrawLine(Tavo_GrDPoint& from, Tavo_GrDPoint& to, Tavo_GrAttr* attr); // 6
+    virtual void DrawPline(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr);      // 7
+    virtual void DrawPolygon(int count, Tavo_GrDPoint* points, Tavo_GrAttr* attr);    // 8
+    virtual void DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr);                     // 9
     virtual void DrawText(const char* text, Tavo_GrDRect& box, Tavo_GrAttr* attr,
-                          unsigned int fontHeight);                                    // 10
-    virtual void DrawText(const char* text, Tavo_GrDPoint& point, Tavo_GrAttr* attr);  // 11
-    virtual void DrawTriangle(Tavo_GrDPoint points[3], Tavo_GrAttr* attr);             // 12
-    virtual void Flush();                                                              // 13
-    virtual void OnAttrChange();                                                       // 14
-    virtual void BeginDrawing(const Tavo_GrDrawing* drawing);                          // 15
-    virtual void EndDrawing();                                                         // 16
-    virtual void BeginLayer(const Tavo_GrLayer* layer);                                // 17
-    virtual void EndLayer();                                                           // 18
-    virtual bool PollDrawInterrupt();                                                  // 19
-    virtual void ResetDrawingInterruptFlags();                                         // 20
+                          unsigned int fontHeight);                                   // 10
+    virtual void DrawText(const char* text, Tavo_GrDPoint& point, Tavo_GrAttr* attr); // 11
+    virtual void DrawTriangle(Tavo_GrDPoint points[3], Tavo_GrAttr* attr);            // 12
+    virtual void Flush();                                                             // 13
+    virtual void OnAttrChange();                                                      // 14
+    virtual void BeginDrawing(const Tavo_GrDrawing* drawing);                         // 15
+    virtual void EndDrawing();                                                        // 16
+    virtual void BeginLayer(const Tavo_GrLayer* layer);                               // 17
+    virtual void EndLayer();                                                          // 18
+    virtual bool PollDrawInterrupt();                                                 // 19
+    virtual void ResetDrawingInterruptFlags();                                        // 20
 
     // ---- Current attribute ------------------------------------------------
     // Makes the attribute current; calls OnAttrChange when it differs from the

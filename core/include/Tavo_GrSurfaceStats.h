@@ -8,19 +8,19 @@
 
 struct Tavo_GrSurfaceStats {
     enum Counter {
-        AttrChanges = 0,      // attribute changes that changed colour or fill
-        Dots = 1,             // dots emitted
-        Polylines = 2,        // polylines emitted as such
-        Lines = 3,            // line segments and open triangles emitted
-        HollowTriangles = 4,  // outlined triangles emitted
-        HollowRects = 5,      // outlined rectangles emitted
-        Polygons = 6,         // polygons emitted as such
-        FilledTriangles = 7,  // filled triangles emitted
-        FilledRects = 8,      // filled rectangles emitted
-        Circles = 9,          // circles emitted, outlined and filled together
-        Texts = 10,           // texts drawn with a font
-        Grids = 11,           // grids drawn
-        Calls = 12,           // calls of other drawings drawn
+        AttrChanges = 0,     // attribute changes that changed colour or fill
+        Dots = 1,            // dots emitted
+        Polylines = 2,       // polylines emitted as such
+        Lines = 3,           // line segments and open triangles emitted
+        HollowTriangles = 4, // outlined triangles emitted
+        HollowRects = 5,     // outlined rectangles emitted
+        Polygons = 6,        // polygons emitted as such
+        FilledTriangles = 7, // filled triangles emitted
+        FilledRects = 8,     // filled rectangles emitted
+        Circles = 9,         // circles emitted, outlined and filled together
+        Texts = 10,          // texts drawn with a font
+        Grids = 11,          // grids drawn
+        Calls = 12,          // calls of other drawings drawn
         CounterCount = 13,
     };
 

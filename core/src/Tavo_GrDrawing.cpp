@@ -193,28 +193,6 @@ void DrawItem(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, const Tavo_GrIt
 
 namespace {
 
-// Builds the layer's spatial index and makes room for whatever a pass may
-// visit, once after items were added, so that later passes do not allocate.
-void PrepareLayer(Tavo_GrDrawingData& data, Tavo_GrLayerData& layer)
-{
-    if (layer.spatialIndex.IsBuilt())
-        return;
-    if (layer.textFacts.Any()) {
-        std::vector<uint32_t> plain;
-        std::vector<uint32_t> text;
-        for (uint32_t i = 0; i < layer.items.size(); ++i)
-            (layer.items[i].holdsText ? text : plain).push_back(i);
-        layer.spatialIndex.Build(layer.bounds, std::move(plain));
-        layer.textIndex.Build(layer.bounds, std::move(text));
-    } else {
-        layer.spatialIndex.Build(layer.bounds);
-    }
-    layer.hits.reserve(layer.items.size());
-    layer.marks.assign(layer.items.size(), 0);
-    data.devicePoints.reserve(data.largestPointCount);
-    Tavo_GrPolygonScratch().reserve(data.largestPointCount);
-}
-
 bool Contains(const Tavo_GrWRect& outer, const Tavo_GrWRect& inner)
 {
     return outer.x1 <= inner.x1 && outer.y1 <= inner.y1 && inner.x2 <= outer.x2 && inner.y2 <= outer.y2;
@@ -322,6 +300,26 @@ bool DrawVisibleItems(Tavo_GrSurface& surface, Tavo_GrDrawingData& data, Tavo_Gr
 
 } // namespace
 
+void Tavo_GrPrepareLayer(Tavo_GrDrawingData& data, Tavo_GrLayerData& layer)
+{
+    if (layer.spatialIndex.IsBuilt())
+        return;
+    if (layer.textFacts.Any()) {
+        std::vector<uint32_t> plain;
+        std::vector<uint32_t> text;
+        for (uint32_t i = 0; i < layer.items.size(); ++i)
+            (layer.items[i].holdsText ? text : plain).push_back(i);
+        layer.spatialIndex.Build(layer.bounds, std::move(plain));
+        layer.textIndex.Build(layer.bounds, std::move(text));
+    } else {
+        layer.spatialIndex.Build(layer.bounds);
+    }
+    layer.hits.reserve(layer.items.size());
+    layer.marks.assign(layer.items.size(), 0);
+    data.devicePoints.reserve(data.largestPointCount);
+    Tavo_GrPolygonScratch().reserve(data.largestPointCount);
+}
+
 bool Tavo_GrDrawing::DrawItems(Tavo_GrSurface& surface, bool withLayers) const
 {
     Tavo_GrDrawingData& data = *m_data;
@@ -337,7 +335,7 @@ bool Tavo_GrDrawing::DrawItems(Tavo_GrSurface& surface, bool withLayers) const
     };
 
     for (const std::unique_ptr<Tavo_GrLayer>& layerObject : data.layers)
-        PrepareLayer(data, *layerObject->m_data);
+        Tavo_GrPrepareLayer(data, *layerObject->m_data);
 
     for (const std::unique_ptr<Tavo_GrLayer>& layerObject : data.layers) {
         Tavo_GrLayerData& layer = *layerObject->m_data;

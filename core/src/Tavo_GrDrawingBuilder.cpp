@@ -191,7 +191,7 @@ bool Tavo_GrDrawingBuilder::AddText(int x, int y, const char* text)
     const long long height = std::llabs(static_cast<long long>(m_attr.GetCharHeight()));
     const long long width = length * height;
     long long left = x;
-    switch (m_attr.GetTextAlign() & 3) {
+    switch (m_attr.GetTextAlign() & Tavo_GrAttr::kHorizontalAlignMask) {
     case Tavo_GrAttr::AlignRight: left = x - width; break;
     case Tavo_GrAttr::AlignCentre: left = x - width / 2; break;
     default: break;

@@ -31,8 +31,6 @@
 #include <string>
 #include <vector>
 
-enum class Tavo_GrItemKind : uint8_t { Dot, Line, Polyline, Polygon, Rect, Circle, Triangle, Text, TextBox, Call };
-
 struct Tavo_GrItem {
     Tavo_GrItemKind kind = Tavo_GrItemKind::Dot;
     bool holdsText = false;
@@ -82,3 +80,8 @@ struct Tavo_GrDrawingData {
     // Device points of the polyline or polygon being drawn.
     std::vector<Tavo_GrDPoint> devicePoints;
 };
+
+// Builds the layer's spatial indexes and makes room for whatever a pass may
+// visit, once after items were added (nothing when the indexes are built), so
+// that later passes do not allocate. Passes and queries call it first.
+void Tavo_GrPrepareLayer(Tavo_GrDrawingData& data, Tavo_GrLayerData& layer);

@@ -27,10 +27,7 @@ bool SameView(const Tavo_GrTransform& a, const Tavo_GrTransform& b)
     if (std::fabs(a.GetScale() - b.GetScale()) > 1e-12 * b.GetScale())
         return false;
     const double s = b.GetScale();
-    return std::fabs((a.GetXOrigin() - b.GetXOrigin()) * s) < kPixelTolerance
-        && std::fabs((a.GetYOrigin() - b.GetYOrigin()) * s) < kPixelTolerance
-        && std::fabs(a.GetXError() - b.GetXError()) < kPixelTolerance
-        && std::fabs(a.GetYError() - b.GetYError()) < kPixelTolerance;
+    return std::fabs((a.GetXOrigin() - b.GetXOrigin()) * s) < kPixelTolerance && std::fabs((a.GetYOrigin() - b.GetYOrigin()) * s) < kPixelTolerance && std::fabs(a.GetXError() - b.GetXError()) < kPixelTolerance && std::fabs(a.GetYError() - b.GetYError()) < kPixelTolerance;
 }
 
 } // namespace

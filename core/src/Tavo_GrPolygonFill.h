@@ -23,8 +23,7 @@ constexpr int kMaxEarClippingPoints = 2000;
 
 inline long long Cross(const Tavo_GrDPoint& o, const Tavo_GrDPoint& a, const Tavo_GrDPoint& b)
 {
-    return (static_cast<long long>(a.x) - o.x) * (static_cast<long long>(b.y) - o.y)
-        - (static_cast<long long>(a.y) - o.y) * (static_cast<long long>(b.x) - o.x);
+    return (static_cast<long long>(a.x) - o.x) * (static_cast<long long>(b.y) - o.y) - (static_cast<long long>(a.y) - o.y) * (static_cast<long long>(b.x) - o.x);
 }
 
 // Whether p lies inside or on triangle abc of the given orientation sign.

@@ -59,7 +59,8 @@ void Tavo_GrSpatialIndex::Build(const std::vector<Tavo_GrWRect>& bounds, std::ve
         return;
 
     m_order = std::move(items);
-    SortIntoTiles(m_order, [&](uint32_t item) -> const Tavo_GrWRect& { return bounds[item]; }, kFanout);
+    SortIntoTiles(
+        m_order, [&](uint32_t item) -> const Tavo_GrWRect& { return bounds[item]; }, kFanout);
 
     std::vector<Node> leaves;
     leaves.reserve((m_order.size() + kFanout - 1) / kFanout);
@@ -77,7 +78,8 @@ void Tavo_GrSpatialIndex::Build(const std::vector<Tavo_GrWRect>& bounds, std::ve
     while (m_levels.back().size() > 1) {
         std::vector<Node>& children = m_levels.back();
         // Reordering the children is safe: each refers to its own range below.
-        SortIntoTiles(children, [](const Node& node) -> const Tavo_GrWRect& { return node.box; }, kFanout);
+        SortIntoTiles(
+            children, [](const Node& node) -> const Tavo_GrWRect& { return node.box; }, kFanout);
         std::vector<Node> parents;
         parents.reserve((children.size() + kFanout - 1) / kFanout);
         for (size_t start = 0; start < children.size(); start += kFanout) {

@@ -80,7 +80,7 @@ inline Tavo_GrWRect PointExtent(const Tavo_GrWRect& nominal, const Tavo_GrWPoint
     const double e = EffectiveCharHeight(charHeight, floor);
     const double width = std::max(length, 0) * e;
     double left = anchor.x;
-    switch (align & 3) {
+    switch (align & Tavo_GrAttr::kHorizontalAlignMask) {
     case Tavo_GrAttr::AlignRight: left -= width; break;
     case Tavo_GrAttr::AlignCentre: left -= width / 2; break;
     default: break;
@@ -100,7 +100,7 @@ inline Tavo_GrWRect BoxExtent(const Tavo_GrWRect& box, int charHeight, int lengt
         line = std::max(line, std::max(length, 0) * e);
     double left = box.x1;
     double right = box.x2;
-    switch (align & 3) {
+    switch (align & Tavo_GrAttr::kHorizontalAlignMask) {
     case Tavo_GrAttr::AlignRight: left -= line; break;
     case Tavo_GrAttr::AlignCentre:
         left -= line / 2;

@@ -92,10 +92,10 @@ struct Tavo_DxfImportResult {
     std::vector<Tavo_DxfMessage> warnings;
     int droppedWarnings = 0; // beyond Tavo_DxfLimits::maxWarnings
 
-    std::string version;       // $ACADVER, e.g. "AC1015"; empty when absent
-    int entitiesRead = 0;      // entities of the ENTITIES section
-    int entitiesSkipped = 0;   // of those and of the blocks they insert
-    long long itemsMade = 0;   // core items added to the drawing
+    std::string version;     // $ACADVER, e.g. "AC1015"; empty when absent
+    int entitiesRead = 0;    // entities of the ENTITIES section
+    int entitiesSkipped = 0; // of those and of the blocks they insert
+    long long itemsMade = 0; // core items added to the drawing
     int layersMade = 0;
 
     // world = (drawing coordinate - origin) * scale, on both axes.

@@ -14,7 +14,16 @@ constexpr int kWheelBrightness[5] = {255, 204, 153, 127, 76};
 
 // ACI 1 ... 9 and the greys 250 ... 255.
 constexpr uint32_t kFixedColours[10] = {
-    0x000000, 0xFF0000, 0xFFFF00, 0x00FF00, 0x00FFFF, 0x0000FF, 0xFF00FF, 0xFFFFFF, 0x808080, 0xC0C0C0,
+    0x000000,
+    0xFF0000,
+    0xFFFF00,
+    0x00FF00,
+    0x00FFFF,
+    0x0000FF,
+    0xFF00FF,
+    0xFFFFFF,
+    0x808080,
+    0xC0C0C0,
 };
 constexpr uint32_t kGreys[6] = {0x333333, 0x505050, 0x696969, 0x828282, 0xBEBEBE, 0xFFFFFF};
 
@@ -32,12 +41,36 @@ Tavo_DxfRgb WheelColour(int aci)
     const int falling = low + (high - low) * (4 - quarter) / 4;
     int r = 0, g = 0, b = 0;
     switch (sextant) {
-    case 0: r = high; g = rising; b = low; break;
-    case 1: r = falling; g = high; b = low; break;
-    case 2: r = low; g = high; b = rising; break;
-    case 3: r = low; g = falling; b = high; break;
-    case 4: r = rising; g = low; b = high; break;
-    default: r = high; g = low; b = falling; break;
+    case 0:
+        r = high;
+        g = rising;
+        b = low;
+        break;
+    case 1:
+        r = falling;
+        g = high;
+        b = low;
+        break;
+    case 2:
+        r = low;
+        g = high;
+        b = rising;
+        break;
+    case 3:
+        r = low;
+        g = falling;
+        b = high;
+        break;
+    case 4:
+        r = rising;
+        g = low;
+        b = high;
+        break;
+    default:
+        r = high;
+        g = low;
+        b = falling;
+        break;
     }
     return {uint8_t(r), uint8_t(g), uint8_t(b)};
 }

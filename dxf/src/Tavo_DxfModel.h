@@ -38,7 +38,7 @@ enum class Tavo_DxfKind : uint8_t {
     Circle,
     Arc,
     Ellipse,
-    Text,  // TEXT and ATTRIB
+    Text, // TEXT and ATTRIB
     MText,
     Solid, // SOLID and TRACE
     Point,
@@ -52,10 +52,10 @@ constexpr int kTavo_DxfByLayer = 256;
 struct Tavo_DxfEntity {
     Tavo_DxfKind kind = Tavo_DxfKind::Line;
     bool hasTrueColour = false;
-    bool closed = false;   // polylines
-    bool inWorld = false;  // polyline points are world (3-D POLYLINE), not OCS
-    int line = 0;          // where the entity starts in the file
-    int layer = 0;         // index in Tavo_DxfModel::layers
+    bool closed = false;  // polylines
+    bool inWorld = false; // polyline points are world (3-D POLYLINE), not OCS
+    int line = 0;         // where the entity starts in the file
+    int layer = 0;        // index in Tavo_DxfModel::layers
     int colour = kTavo_DxfByLayer;
     uint32_t trueColour = 0; // 0x00RRGGBB when hasTrueColour
 
@@ -64,21 +64,21 @@ struct Tavo_DxfEntity {
     // alignment point); ELLIPSE: 0 centre, 1 end of the major axis relative to
     // the centre; SOLID: the four corners.
     Tavo_DxfPoint p[4];
-    int corners = 0;     // SOLID: corners given
+    int corners = 0; // SOLID: corners given
     bool hasAlignmentPoint = false;
 
-    double radius = 0.0;        // CIRCLE, ARC
-    double start = 0.0;         // ARC: degrees; ELLIPSE: parameter
-    double end = 360.0;         // ARC: degrees; ELLIPSE: parameter
-    double ratio = 1.0;         // ELLIPSE: minor / major axis
-    double height = 0.0;        // TEXT, MTEXT: character height
-    double rotation = 0.0;      // TEXT, MTEXT, INSERT: degrees
-    double lineSpacing = 1.0;   // MTEXT: factor
-    double elevation = 0.0;     // LWPOLYLINE, POLYLINE: z of the OCS points
-    int horizontal = 0;         // TEXT: 72; MTEXT: attachment point 71
-    int vertical = 0;           // TEXT: 73 (ATTRIB: 74)
+    double radius = 0.0;      // CIRCLE, ARC
+    double start = 0.0;       // ARC: degrees; ELLIPSE: parameter
+    double end = 360.0;       // ARC: degrees; ELLIPSE: parameter
+    double ratio = 1.0;       // ELLIPSE: minor / major axis
+    double height = 0.0;      // TEXT, MTEXT: character height
+    double rotation = 0.0;    // TEXT, MTEXT, INSERT: degrees
+    double lineSpacing = 1.0; // MTEXT: factor
+    double elevation = 0.0;   // LWPOLYLINE, POLYLINE: z of the OCS points
+    int horizontal = 0;       // TEXT: 72; MTEXT: attachment point 71
+    int vertical = 0;         // TEXT: 73 (ATTRIB: 74)
 
-    double scaleX = 1.0;        // INSERT
+    double scaleX = 1.0; // INSERT
     double scaleY = 1.0;
     int columns = 1;
     int rows = 1;
@@ -91,7 +91,7 @@ struct Tavo_DxfEntity {
 
 struct Tavo_DxfLayer {
     std::string name;
-    int colour = 7;        // ACI; negative: switched off
+    int colour = 7; // ACI; negative: switched off
     bool hasTrueColour = false;
     uint32_t trueColour = 0;
     bool frozen = false;

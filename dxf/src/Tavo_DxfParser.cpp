@@ -7,10 +7,10 @@
 namespace {
 
 // Group codes of the DXF format that the parser reads.
-constexpr int kCodeType = 0;        // starts an entity, table entry or section marker
-constexpr int kCodeText = 1;        // text value
-constexpr int kCodeName = 2;        // section, block, table name
-constexpr int kCodeExtraText = 3;   // MTEXT text chunks, header code page
+constexpr int kCodeType = 0;      // starts an entity, table entry or section marker
+constexpr int kCodeText = 1;      // text value
+constexpr int kCodeName = 2;      // section, block, table name
+constexpr int kCodeExtraText = 3; // MTEXT text chunks, header code page
 constexpr int kCodeLayer = 8;
 constexpr int kCodeHeaderVariable = 9;
 constexpr int kCodeColour = 62;
@@ -42,13 +42,11 @@ bool Is(std::string_view value, const char* name)
 bool ReadDouble(const Tavo_DxfPair& pair, double& value, std::string& problem)
 {
     if (!Tavo_DxfParseDouble(pair.value, value)) {
-        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line)
-                + " is not a finite number";
+        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line) + " is not a finite number";
         return false;
     }
     if (std::fabs(value) > kTavo_DxfLargestCoordinate) {
-        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line)
-                + " holds an absurdly large number";
+        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line) + " holds an absurdly large number";
         return false;
     }
     return true;
@@ -57,8 +55,7 @@ bool ReadDouble(const Tavo_DxfPair& pair, double& value, std::string& problem)
 bool ReadInt(const Tavo_DxfPair& pair, long long lowest, long long highest, long long& value, std::string& problem)
 {
     if (!Tavo_DxfParseInt(pair.value, value) || value < lowest || value > highest) {
-        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line)
-                + " is not a whole number in " + std::to_string(lowest) + " ... " + std::to_string(highest);
+        problem = "group code " + std::to_string(pair.code) + " at line " + std::to_string(pair.line) + " is not a whole number in " + std::to_string(lowest) + " ... " + std::to_string(highest);
         return false;
     }
     return true;
@@ -75,7 +72,8 @@ bool ReadCoordinate(Tavo_DxfEntity& entity, const Tavo_DxfPair& pair, std::strin
     if (!ReadDouble(pair, value, problem))
         return false;
     Tavo_DxfPoint& p = entity.p[point];
-    (axis == 0 ? p.x : axis == 1 ? p.y : p.z) = value;
+    (axis == 0 ? p.x : axis == 1 ? p.y
+                                 : p.z) = value;
     if (entity.kind == Tavo_DxfKind::Solid && axis == 0)
         entity.corners = std::max(entity.corners, point + 1);
     if (entity.kind == Tavo_DxfKind::Text && point == 1)
@@ -84,9 +82,9 @@ bool ReadCoordinate(Tavo_DxfEntity& entity, const Tavo_DxfPair& pair, std::strin
 }
 
 enum class EntityType {
-    Drawn,        // read into the model
-    Quiet,        // skipped without a word: not drawn by nature
-    Unsupported,  // skipped with a warning
+    Drawn,       // read into the model
+    Quiet,       // skipped without a word: not drawn by nature
+    Unsupported, // skipped with a warning
 };
 
 struct TypeInfo {
@@ -150,7 +148,8 @@ bool ApplyPair(Tavo_DxfModel& model, Tavo_DxfEntity& entity, bool isAttrib, cons
     case 230:
         if (!ReadDouble(pair, value, problem))
             return false;
-        (code == 210 ? entity.normal.x : code == 220 ? entity.normal.y : entity.normal.z) = value;
+        (code == 210 ? entity.normal.x : code == 220 ? entity.normal.y
+                                                     : entity.normal.z) = value;
         return true;
     default: break;
     }
@@ -192,9 +191,10 @@ bool ApplyPair(Tavo_DxfModel& model, Tavo_DxfEntity& entity, bool isAttrib, cons
         if (code == 41 || code == 42 || code == 50 || code == 44 || code == 45) {
             if (!ReadDouble(pair, value, problem))
                 return false;
-            (code == 41 ? entity.scaleX : code == 42 ? entity.scaleY : code == 50 ? entity.rotation
-                                                                     : code == 44 ? entity.columnSpacing
-                                                                                  : entity.rowSpacing) = value;
+            (code == 41 ? entity.scaleX : code == 42 ? entity.scaleY
+                 : code == 50                        ? entity.rotation
+                 : code == 44                        ? entity.columnSpacing
+                                                     : entity.rowSpacing) = value;
             return true;
         }
         if (code == 70 || code == 71) {
@@ -246,7 +246,8 @@ bool ApplyPair(Tavo_DxfModel& model, Tavo_DxfEntity& entity, bool isAttrib, cons
             return true;
         }
         if (code == 40 || code == 50 || code == 44) {
-            return ReadDouble(pair, code == 40 ? entity.height : code == 50 ? entity.rotation : entity.lineSpacing,
+            return ReadDouble(pair, code == 40 ? entity.height : code == 50 ? entity.rotation
+                                                                            : entity.lineSpacing,
                               problem);
         }
         if (code == 71) {
@@ -380,8 +381,7 @@ bool Tavo_DxfParser::ReadSection(Tavo_DxfModel& model, int line)
         return ReadBlocks(model);
     if (Is(name.value, "ENTITIES"))
         return ReadEntities(model, model.entities, "ENDSEC", true);
-    if (!Is(name.value, "CLASSES") && !Is(name.value, "OBJECTS") && !Is(name.value, "THUMBNAILIMAGE")
-        && !Is(name.value, "ACDSDATA"))
+    if (!Is(name.value, "CLASSES") && !Is(name.value, "OBJECTS") && !Is(name.value, "THUMBNAILIMAGE") && !Is(name.value, "ACDSDATA"))
         m_warnings.Add(line, "section " + std::string(name.value.substr(0, 40)) + ": skipped, not known");
     return SkipTo("ENDSEC");
 }
@@ -521,7 +521,8 @@ bool Tavo_DxfParser::ReadBlock(Tavo_DxfModel& model, int line)
         } else if (pair.code == 10 || pair.code == 20 || pair.code == 30) {
             double value = 0.0;
             if (ReadDouble(pair, value, problem))
-                (pair.code == 10 ? block.base.x : pair.code == 20 ? block.base.y : block.base.z) = value;
+                (pair.code == 10 ? block.base.x : pair.code == 20 ? block.base.y
+                                                                  : block.base.z) = value;
         }
     }
     if (m_reader.Failed() || pair.code != kCodeType)
@@ -556,8 +557,7 @@ bool Tavo_DxfParser::ReadEntities(Tavo_DxfModel& model, std::vector<Tavo_DxfEnti
         if (Is(pair.value, terminator))
             return true;
         if (Is(pair.value, "ENDSEC") || Is(pair.value, "EOF"))
-            return Fail(pair.line, std::string("found ") + std::string(pair.value) + " where " + terminator
-                                       + " was expected");
+            return Fail(pair.line, std::string("found ") + std::string(pair.value) + " where " + terminator + " was expected");
         if (!ReadEntity(model, pair, into, countEntities))
             return false;
     }
@@ -612,8 +612,7 @@ bool Tavo_DxfParser::ReadEntity(Tavo_DxfModel& model, const Tavo_DxfPair& start,
         }
         if (pair.code == kCodeFollowFlag)
             continue;
-        if (isDimension && pair.code != kCodeName && pair.code != kCodeLayer && pair.code != kCodeColour
-            && pair.code != kCodeTrueColour)
+        if (isDimension && pair.code != kCodeName && pair.code != kCodeLayer && pair.code != kCodeColour && pair.code != kCodeTrueColour)
             continue; // its geometry is in its block, drawn where the block has it
         ApplyPair(model, entity, isAttrib, pair, invisible, problem);
     }

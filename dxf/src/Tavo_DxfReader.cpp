@@ -110,8 +110,7 @@ bool Tavo_DxfReader::Next(Tavo_DxfPair& pair)
     const int codeLineNumber = m_line;
     long long code = 0;
     if (!Tavo_DxfParseInt(codeLine, code) || code < -32768 || code > 32767)
-        return Fail(codeLineNumber, "expected a group code (a number) but found \""
-                                        + std::string(Trimmed(codeLine).substr(0, 40)) + "\"");
+        return Fail(codeLineNumber, "expected a group code (a number) but found \"" + std::string(Trimmed(codeLine).substr(0, 40)) + "\"");
     std::string_view valueLine;
     if (!NextLine(valueLine))
         return Fail(codeLineNumber, "the file ends after group code " + std::to_string(code) + ", before its value");

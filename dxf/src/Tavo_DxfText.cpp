@@ -15,9 +15,38 @@ constexpr char32_t kParagraph = 0x2029; // stands for \P until the lines are spl
 
 // Windows-1252's characters at 0x80 ... 0x9F (0: none there).
 constexpr char16_t kCp1252High[32] = {
-    0x20AC, 0,      0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
-    0x2039, 0x0152, 0,      0x017D, 0,      0,      0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
-    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0,      0x017E, 0x0178,
+    0x20AC,
+    0,
+    0x201A,
+    0x0192,
+    0x201E,
+    0x2026,
+    0x2020,
+    0x2021,
+    0x02C6,
+    0x2030,
+    0x0160,
+    0x2039,
+    0x0152,
+    0,
+    0x017D,
+    0,
+    0,
+    0x2018,
+    0x2019,
+    0x201C,
+    0x201D,
+    0x2022,
+    0x2013,
+    0x2014,
+    0x02DC,
+    0x2122,
+    0x0161,
+    0x203A,
+    0x0153,
+    0,
+    0x017E,
+    0x0178,
 };
 
 // The characters of the raw string: UTF-8 decoded (bad sequences become
@@ -36,10 +65,13 @@ std::u32string Decode(std::string_view raw, bool utf8)
             ++i;
             continue;
         }
-        int length = lead >= 0xF0 && lead <= 0xF4 ? 4 : lead >= 0xE0 ? 3 : lead >= 0xC2 && lead <= 0xDF ? 2 : 0;
+        int length = lead >= 0xF0 && lead <= 0xF4 ? 4 : lead >= 0xE0 ? 3
+            : lead >= 0xC2 && lead <= 0xDF                           ? 2
+                                                                     : 0;
         if (lead > 0xF4)
             length = 0;
-        char32_t value = length == 2 ? lead & 0x1F : length == 3 ? lead & 0x0F : lead & 0x07;
+        char32_t value = length == 2 ? lead & 0x1F : length == 3 ? lead & 0x0F
+                                                                 : lead & 0x07;
         bool good = length > 0 && i + length <= raw.size();
         for (int k = 1; good && k < length; ++k) {
             const unsigned char next = static_cast<unsigned char>(raw[i + k]);
@@ -92,11 +124,19 @@ bool ControlCode(const std::u32string& text, size_t i, std::u32string& out, size
     const char32_t code = text[i + 2];
     length = 3;
     switch (code) {
-    case 'd': case 'D': out.push_back(kDegree); return true;
-    case 'p': case 'P': out.push_back(kPlusMinus); return true;
-    case 'c': case 'C': out.push_back(kDiameter); return true;
+    case 'd':
+    case 'D': out.push_back(kDegree); return true;
+    case 'p':
+    case 'P': out.push_back(kPlusMinus); return true;
+    case 'c':
+    case 'C': out.push_back(kDiameter); return true;
     case '%': out.push_back('%'); return true;
-    case 'u': case 'U': case 'o': case 'O': case 'k': case 'K': return true; // look switches
+    case 'u':
+    case 'U':
+    case 'o':
+    case 'O':
+    case 'k':
+    case 'K': return true; // look switches
     default: break;
     }
     if (code >= '0' && code <= '9') {
@@ -169,10 +209,27 @@ std::u32string StripFormatting(const std::u32string& text)
         }
         const char32_t code = text[i + 1];
         switch (code) {
-        case 'P': case 'n': out.push_back(kParagraph); i += 2; break;
-        case '~': out.push_back(kHardSpace); i += 2; break;
-        case '\\': case '{': case '}': out.push_back(code); i += 2; break;
-        case 'L': case 'l': case 'O': case 'o': case 'K': case 'k': i += 2; break;
+        case 'P':
+        case 'n':
+            out.push_back(kParagraph);
+            i += 2;
+            break;
+        case '~':
+            out.push_back(kHardSpace);
+            i += 2;
+            break;
+        case '\\':
+        case '{':
+        case '}':
+            out.push_back(code);
+            i += 2;
+            break;
+        case 'L':
+        case 'l':
+        case 'O':
+        case 'o':
+        case 'K':
+        case 'k': i += 2; break;
         case 'S': {
             // \Sa^b; \Sa/b; \Sa#b; : a fraction, shown as a/b.
             size_t k = i + 2;
@@ -183,15 +240,31 @@ std::u32string StripFormatting(const std::u32string& text)
             i = k < text.size() ? k + 1 : k;
             break;
         }
-        case 'f': case 'F': case 'H': case 'h': case 'W': case 'w': case 'Q': case 'q': case 'T': case 't':
-        case 'A': case 'a': case 'C': case 'c': case 'p':
+        case 'f':
+        case 'F':
+        case 'H':
+        case 'h':
+        case 'W':
+        case 'w':
+        case 'Q':
+        case 'q':
+        case 'T':
+        case 't':
+        case 'A':
+        case 'a':
+        case 'C':
+        case 'c':
+        case 'p':
             i = PastSemicolon(text, i + 2);
             break;
         case 'M': // \M+nXXXX: a double-byte character of an Asian code page
             i = std::min(text.size(), i + 8);
             out.push_back('?');
             break;
-        default: out.push_back(code); i += 2; break;
+        default:
+            out.push_back(code);
+            i += 2;
+            break;
         }
     }
     return out;

@@ -29,12 +29,14 @@ constexpr int kTextTop = 3;
 
 char HorizontalAlign(int column)
 {
-    return column == 1 ? Tavo_GrAttr::AlignCentre : column == 2 ? Tavo_GrAttr::AlignRight : Tavo_GrAttr::AlignLeft;
+    return column == 1 ? Tavo_GrAttr::AlignCentre : column == 2 ? Tavo_GrAttr::AlignRight
+                                                                : Tavo_GrAttr::AlignLeft;
 }
 
 char VerticalAlign(int row)
 {
-    return row == 0 ? Tavo_GrAttr::AlignTop : row == 1 ? Tavo_GrAttr::AlignMiddle : Tavo_GrAttr::AlignBottom;
+    return row == 0 ? Tavo_GrAttr::AlignTop : row == 1 ? Tavo_GrAttr::AlignMiddle
+                                                       : Tavo_GrAttr::AlignBottom;
 }
 
 double Length(const Tavo_DxfXY& v)
@@ -103,14 +105,11 @@ void Tavo_DxfWalker::Skip(const Tavo_DxfEntity& entity, const std::string& why)
 bool Tavo_DxfWalker::Count(long long items, long long points, long long textBytes)
 {
     if (m_items + items > m_limits.maxItems)
-        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxItems)
-                    + " items (lines, polylines, texts ...), the most an import makes");
+        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxItems) + " items (lines, polylines, texts ...), the most an import makes");
     if (m_points + points > m_limits.maxPoints)
-        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxPoints)
-                    + " points, the most an import makes");
+        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxPoints) + " points, the most an import makes");
     if (m_textBytes + textBytes > m_limits.maxTextBytes)
-        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxTextBytes)
-                    + " bytes of text, the most an import makes");
+        return Fail("the drawing expands to more than " + std::to_string(m_limits.maxTextBytes) + " bytes of text, the most an import makes");
     m_items += items;
     m_points += points;
     m_textBytes += textBytes;
@@ -170,8 +169,7 @@ void Tavo_DxfWalker::Entity(const Tavo_DxfEntity& entity, const Context& context
     if (m_failed)
         return;
     if (++m_work > m_limits.maxWork) {
-        Fail("the drawing's inserts expand to more than " + std::to_string(m_limits.maxWork)
-             + " entities, the most an import visits");
+        Fail("the drawing's inserts expand to more than " + std::to_string(m_limits.maxWork) + " entities, the most an import visits");
         return;
     }
     if (entity.kind == Tavo_DxfKind::Insert) {
@@ -219,8 +217,7 @@ void Tavo_DxfWalker::EmitPolyline(const Tavo_DxfStyle& style, bool closed)
     auto last = std::unique(m_scratch.begin(), m_scratch.end(),
                             [](const Tavo_DxfXY& a, const Tavo_DxfXY& b) { return a.x == b.x && a.y == b.y; });
     m_scratch.erase(last, m_scratch.end());
-    if (closed && m_scratch.size() > 1 && m_scratch.front().x == m_scratch.back().x
-        && m_scratch.front().y == m_scratch.back().y)
+    if (closed && m_scratch.size() > 1 && m_scratch.front().x == m_scratch.back().x && m_scratch.front().y == m_scratch.back().y)
         m_scratch.pop_back();
     if (m_scratch.empty())
         return;
@@ -332,8 +329,8 @@ void Tavo_DxfWalker::Polyline(const Tavo_DxfEntity& entity, const Context& conte
     if (entity.vertices.empty())
         return;
     const Tavo_DxfAffine t = entity.inWorld
-                                 ? context.transform
-                                 : context.transform.After(Tavo_DxfObjectToWorld(entity.normal, entity.elevation));
+        ? context.transform
+        : context.transform.After(Tavo_DxfObjectToWorld(entity.normal, entity.elevation));
     const Tavo_DxfFlattening flattening = LocalFlattening(t);
     m_scratch.clear();
     const size_t count = entity.vertices.size();
@@ -431,13 +428,13 @@ void Tavo_DxfWalker::MText(const Tavo_DxfEntity& entity, const Context& context,
     const int row = attachment / 3;
     const int column = attachment % 3;
     const double height = entity.height > 0.0 ? entity.height : kDefaultTextHeight;
-    const double pitch = height * kMTextLinePitch
-                       * std::clamp(entity.lineSpacing, kSmallestLineSpacing, kLargestLineSpacing);
+    const double pitch = height * kMTextLinePitch * std::clamp(entity.lineSpacing, kSmallestLineSpacing, kLargestLineSpacing);
     const double heightFactor = Length(context.transform.ApplyVector(0.0, 1.0));
     const int count = static_cast<int>(lines.size());
     for (int i = 0; i < count && !m_failed; ++i) {
         // The block of lines hangs from, centres on or stands on the point.
-        const double offset = row == 0 ? -i * pitch : row == 1 ? ((count - 1) / 2.0 - i) * pitch : (count - 1 - i) * pitch;
+        const double offset = row == 0 ? -i * pitch : row == 1 ? ((count - 1) / 2.0 - i) * pitch
+                                                               : (count - 1 - i) * pitch;
         Tavo_DxfTextPlacement placement;
         placement.anchor = context.transform.Apply(entity.p[0].x, entity.p[0].y + offset);
         placement.height = height * heightFactor;
@@ -479,8 +476,7 @@ void Tavo_DxfWalker::Insert(const Tavo_DxfEntity& entity, const Context& context
             inner.transform = placement.After(Tavo_DxfAffine::Translation(c * entity.columnSpacing, r * entity.rowSpacing))
                                   .After(scaling);
             if (++m_work > m_limits.maxWork) {
-                Fail("the drawing's inserts expand to more than " + std::to_string(m_limits.maxWork)
-                     + " entities, the most an import visits");
+                Fail("the drawing's inserts expand to more than " + std::to_string(m_limits.maxWork) + " entities, the most an import visits");
                 break;
             }
             for (const Tavo_DxfEntity& child : definition.entities) {

@@ -16,7 +16,7 @@ constexpr unsigned int kNoMinimumViewHeight = 0;
 // What the view shows around the drawing.
 constexpr COLORREF kBackground = RGB(255, 255, 255);
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(DrawingView, Tavo_WiDrawWnd)
     ON_WM_MOUSEWHEEL()

@@ -10,8 +10,7 @@
 #include "Tavo_WiDrawWnd.h"
 #include "Tavo_WiNativeWindowSurface.h"
 
-class DrawingView : public Tavo_WiDrawWnd
-{
+class DrawingView : public Tavo_WiDrawWnd {
 public:
     // Zoom levels per wheel notch: five levels double the scale.
     static constexpr int LevelsPerNotch = 1;

@@ -33,7 +33,7 @@ void Tree(Tavo_GrDrawingBuilder& build, int x, int y)
     build.AddCircle(x, y, 18);
 }
 
-}  // namespace
+} // namespace
 
 void BuildSitePlan(Tavo_GrDrawing& drawing)
 {

@@ -6,7 +6,7 @@ constexpr UINT kViewId = 1;
 constexpr int kWidth = 900;
 constexpr int kHeight = 650;
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(ViewerFrame, CWnd)
     ON_WM_SIZE()

@@ -8,8 +8,7 @@
 
 class Tavo_GrDrawing;
 
-class ViewerFrame : public CWnd
-{
+class ViewerFrame : public CWnd {
 public:
     // Creates the frame (hidden) and the view, and binds the drawing, which
     // must outlive the windows. FALSE when a window could not be created.

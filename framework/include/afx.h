@@ -23,10 +23,10 @@
 // The packed, signed coordinates of a mouse message (as <windowsx.h> has
 // them; that header's function-like macros would clash with member names).
 #ifndef GET_X_LPARAM
-#define GET_X_LPARAM(lp) ((int)(short)LOWORD(lp))
+#define GET_X_LPARAM(lp) static_cast<int>(static_cast<short>(LOWORD(lp)))
 #endif
 #ifndef GET_Y_LPARAM
-#define GET_Y_LPARAM(lp) ((int)(short)HIWORD(lp))
+#define GET_Y_LPARAM(lp) static_cast<int>(static_cast<short>(HIWORD(lp)))
 #endif
 
 #include <cstdarg>
@@ -92,7 +92,8 @@
 // GetSafeHwnd, GetSafeHdc and GetSafeHandle may be called through a null
 // pointer, as the framework allows; reading `this` back through a volatile
 // keeps the compiler from assuming that it is never null.
-template <class T> inline const T* AfxNullableThis(const T* p) noexcept
+template <class T>
+inline const T* AfxNullableThis(const T* p) noexcept
 {
     const T* volatile q = p;
     return q;
@@ -105,8 +106,7 @@ template <class T> inline const T* AfxNullableThis(const T* p) noexcept
 class CPoint;
 class CRect;
 
-class CSize : public tagSIZE
-{
+class CSize : public tagSIZE {
 public:
     CSize() noexcept
     {
@@ -159,8 +159,7 @@ public:
     inline CPoint operator-(POINT point) const noexcept;
 };
 
-class CPoint : public tagPOINT
-{
+class CPoint : public tagPOINT {
 public:
     CPoint() noexcept
     {
@@ -219,8 +218,7 @@ public:
 inline CPoint CSize::operator+(POINT point) const noexcept { return CPoint(cx + point.x, cy + point.y); }
 inline CPoint CSize::operator-(POINT point) const noexcept { return CPoint(cx - point.x, cy - point.y); }
 
-class CRect : public tagRECT
-{
+class CRect : public tagRECT {
 public:
     CRect() noexcept { left = top = right = bottom = 0; }
     CRect(int l, int t, int r, int b) noexcept
@@ -400,8 +398,7 @@ public:
 // ---------------------------------------------------------------------------
 
 // The root of the framework's class tree. Objects are not copyable.
-class AFX_FRAMEWORK_CLASS CObject
-{
+class AFX_FRAMEWORK_CLASS CObject {
 public:
     virtual ~CObject() = default;
     CObject(const CObject&) = delete;
@@ -415,8 +412,7 @@ protected:
 // CString: the framework's 8-bit string
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CString
-{
+class AFX_FRAMEWORK_CLASS CString {
 public:
     CString() = default;
     CString(const CString& stringSrc) = default;
@@ -517,10 +513,9 @@ typedef CString CStringA;
 // Exceptions: thrown as pointers, released with Delete()
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CException : public CObject
-{
+class AFX_FRAMEWORK_CLASS CException : public CObject {
 public:
-    explicit CException(BOOL bAutoDelete = TRUE) : m_bAutoDelete(bAutoDelete) { }
+    explicit CException(BOOL bAutoDelete = TRUE) : m_bAutoDelete(bAutoDelete) {}
     // Deletes the exception object if it was allocated on the heap by the
     // thrower (auto-delete), as every framework exception is.
     void Delete();
@@ -530,18 +525,16 @@ protected:
     BOOL m_bAutoDelete = TRUE;
 };
 
-class AFX_FRAMEWORK_CLASS CSimpleException : public CException
-{
+class AFX_FRAMEWORK_CLASS CSimpleException : public CException {
 public:
-    explicit CSimpleException(BOOL bAutoDelete = TRUE) : CException(bAutoDelete) { }
+    explicit CSimpleException(BOOL bAutoDelete = TRUE) : CException(bAutoDelete) {}
 };
 
 // Thrown by AfxThrowResourceException: a Windows resource (a window class, a
 // GDI object) could not be created or found.
-class AFX_FRAMEWORK_CLASS CResourceException : public CSimpleException
-{
+class AFX_FRAMEWORK_CLASS CResourceException : public CSimpleException {
 public:
-    CResourceException() : CSimpleException(TRUE) { }
+    CResourceException() : CSimpleException(TRUE) {}
     BOOL GetErrorMessage(LPSTR lpszError, UINT nMaxError, PUINT pnHelpContext = NULL) const override;
 };
 
@@ -587,4 +580,4 @@ AFX_FRAMEWORK_API HINSTANCE AFXAPI AfxFindResourceHandle(LPCSTR lpszName, LPCSTR
 // The same for string nID, found through the string block that holds it.
 AFX_FRAMEWORK_API HINSTANCE AFXAPI AfxFindStringResourceHandle(UINT nID);
 
-#endif  // TAVO_FRAMEWORK_AFX_H
+#endif // TAVO_FRAMEWORK_AFX_H

@@ -7,10 +7,9 @@
 #include "afxwin.h"
 #include <commdlg.h>
 
-class AFX_FRAMEWORK_CLASS CCommonDialog : public CDialog
-{
+class AFX_FRAMEWORK_CLASS CCommonDialog : public CDialog {
 public:
-    explicit CCommonDialog(CWnd* pParentWnd) : CDialog(pParentWnd) { }
+    explicit CCommonDialog(CWnd* pParentWnd) : CDialog(pParentWnd) {}
     ~CCommonDialog() override = default;
 };
 
@@ -21,14 +20,12 @@ public:
 //
 // The handles PrintDlg returns in m_pd (hDC, hDevMode, hDevNames) belong to
 // the caller: this class never frees them.
-class AFX_FRAMEWORK_CLASS CPrintDialog : public CCommonDialog
-{
+class AFX_FRAMEWORK_CLASS CPrintDialog : public CCommonDialog {
 public:
     PRINTDLG m_pd;
 
     explicit CPrintDialog(BOOL bPrintSetupOnly,
-                          DWORD dwFlags
-                          = PD_ALLPAGES | PD_USEDEVMODECOPIES | PD_NOPAGENUMS | PD_HIDEPRINTTOFILE | PD_NOSELECTION,
+                          DWORD dwFlags = PD_ALLPAGES | PD_USEDEVMODECOPIES | PD_NOPAGENUMS | PD_HIDEPRINTTOFILE | PD_NOSELECTION,
                           CWnd* pParentWnd = NULL);
     ~CPrintDialog() override = default;
 
@@ -40,7 +37,7 @@ public:
     // m_pd.hDC; NULL without printer data. The caller deletes it.
     HDC CreatePrinterDC();
     HDC GetPrinterDC() const;
-    LPDEVMODE GetDevMode() const;  // locks m_pd.hDevMode; NULL without one
+    LPDEVMODE GetDevMode() const; // locks m_pd.hDevMode; NULL without one
     CString GetDriverName() const;
     CString GetDeviceName() const;
     CString GetPortName() const;
@@ -52,4 +49,4 @@ public:
     int GetToPage() const;
 };
 
-#endif  // TAVO_FRAMEWORK_AFXDLGS_H
+#endif // TAVO_FRAMEWORK_AFXDLGS_H

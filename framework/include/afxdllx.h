@@ -10,4 +10,4 @@
 
 #include "afxwin.h"
 
-#endif  // TAVO_FRAMEWORK_AFXDLLX_H
+#endif // TAVO_FRAMEWORK_AFXDLLX_H

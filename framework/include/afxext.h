@@ -21,17 +21,17 @@ struct AFX_FRAMEWORK_CLASS CPrintInfo {
     CPrintInfo(const CPrintInfo&) = delete;
     CPrintInfo& operator=(const CPrintInfo&) = delete;
 
-    CPrintDialog* m_pPD = NULL;  // owned
+    CPrintDialog* m_pPD = NULL; // owned
     BOOL m_bDocObject = FALSE;
     DWORD m_dwFlags = 0;
     UINT m_nOffsetPage = 0;
-    BOOL m_bDirect = FALSE;  // print without showing the dialog
+    BOOL m_bDirect = FALSE; // print without showing the dialog
     BOOL m_bPreview = FALSE;
     BOOL m_bContinuePrinting = TRUE;
     UINT m_nCurPage = 1;
     UINT m_nNumPreviewPages = 0;
     CString m_strPageDesc;
-    LPVOID m_lpUserData = NULL;  // not owned
+    LPVOID m_lpUserData = NULL; // not owned
     CRect m_rectDraw;
     int m_nJobNumber = 0;
 
@@ -44,4 +44,4 @@ struct AFX_FRAMEWORK_CLASS CPrintInfo {
     UINT GetOffsetPage() const;
 };
 
-#endif  // TAVO_FRAMEWORK_AFXEXT_H
+#endif // TAVO_FRAMEWORK_AFXEXT_H

@@ -33,8 +33,8 @@ class CRgn;
 class CScrollBar;
 class CWinThread;
 class CWinApp;
-class CPrintDialog;  // <afxdlgs.h>
-struct CCreateContext;  // document/view creation context; passed through, never read
+class CPrintDialog;    // <afxdlgs.h>
+struct CCreateContext; // document/view creation context; passed through, never read
 
 // ---------------------------------------------------------------------------
 // Message maps
@@ -48,25 +48,25 @@ typedef void (AFX_MSG_CALL CWnd::*AFX_PMSGW)(void);
 enum AfxSig : UINT_PTR {
     AfxSig_end = 0,
     AfxSig_lwl,  // LRESULT (WPARAM, LPARAM): ON_MESSAGE, ON_REGISTERED_MESSAGE
-    AfxSig_vv,  // void (void)
-    AfxSig_is,  // int (LPCREATESTRUCT)
-    AfxSig_bD,  // BOOL (CDC*)
-    AfxSig_vwii,  // void (UINT, int, int)
+    AfxSig_vv,   // void (void)
+    AfxSig_is,   // int (LPCREATESTRUCT)
+    AfxSig_bD,   // BOOL (CDC*)
+    AfxSig_vwii, // void (UINT, int, int)
     AfxSig_vii,  // void (int, int)
-    AfxSig_vwwx,  // void (UINT, UINT, CScrollBar*)
-    AfxSig_vt,  // void (UINT_PTR)
+    AfxSig_vwwx, // void (UINT, UINT, CScrollBar*)
+    AfxSig_vt,   // void (UINT_PTR)
     AfxSig_vwp,  // void (UINT, CPoint)
-    AfxSig_bwsp,  // BOOL (UINT, short, CPoint)
-    AfxSig_vW,  // void (CWnd*)
-    AfxSig_vPOS,  // void (WINDOWPOS*)
-    AfxSig_vwww,  // void (UINT, UINT, UINT)
-    AfxSig_bWww,  // BOOL (CWnd*, UINT, UINT)
-    AfxSig_iWww,  // int (CWnd*, UINT, UINT)
-    AfxSig_vMMI,  // void (MINMAXINFO*)
+    AfxSig_bwsp, // BOOL (UINT, short, CPoint)
+    AfxSig_vW,   // void (CWnd*)
+    AfxSig_vPOS, // void (WINDOWPOS*)
+    AfxSig_vwww, // void (UINT, UINT, UINT)
+    AfxSig_bWww, // BOOL (CWnd*, UINT, UINT)
+    AfxSig_iWww, // int (CWnd*, UINT, UINT)
+    AfxSig_vMMI, // void (MINMAXINFO*)
     AfxSig_vbw,  // void (BOOL, UINT)
-    AfxSig_lp,  // LRESULT (CPoint)
+    AfxSig_lp,   // LRESULT (CPoint)
     AfxSig_vWp,  // void (CWnd*, CPoint)
-    AfxSig_wv,  // UINT (void)
+    AfxSig_wv,   // UINT (void)
 };
 
 // Registered messages are entries with this message code; their nSig holds
@@ -75,11 +75,11 @@ enum AfxSig : UINT_PTR {
 #define AFX_REGISTERED_MESSAGE_CODE 0xC002
 
 struct AFX_MSGMAP_ENTRY {
-    UINT nMessage;  // window message
-    UINT nCode;  // control code or WM_NOTIFY code (unused here)
-    UINT nID;  // control id (unused here)
+    UINT nMessage; // window message
+    UINT nCode;    // control code or WM_NOTIFY code (unused here)
+    UINT nID;      // control id (unused here)
     UINT nLastID;  // last control id of a range (unused here)
-    UINT_PTR nSig;  // handler signature, or the address of a registered id
+    UINT_PTR nSig; // handler signature, or the address of a registered id
     AFX_PMSG pfn;  // handler
 };
 
@@ -175,8 +175,7 @@ protected: \
 // CCmdTarget: the root of every class with a message map
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CCmdTarget : public CObject
-{
+class AFX_FRAMEWORK_CLASS CCmdTarget : public CObject {
 public:
     CCmdTarget() = default;
     ~CCmdTarget() override = default;
@@ -193,8 +192,7 @@ protected:
 // Owns m_hObject: the destructor and DeleteObject delete it; Detach gives it
 // up. Temporary objects (FromHandle of a handle that no object owns) never
 // delete their handle and are themselves deleted at idle time.
-class AFX_FRAMEWORK_CLASS CGdiObject : public CObject
-{
+class AFX_FRAMEWORK_CLASS CGdiObject : public CObject {
 public:
     HGDIOBJ m_hObject = NULL;
 
@@ -228,8 +226,7 @@ public:
     BOOL operator!=(const CGdiObject& obj) const { return obj.m_hObject != m_hObject; }
 };
 
-class AFX_FRAMEWORK_CLASS CPen : public CGdiObject
-{
+class AFX_FRAMEWORK_CLASS CPen : public CGdiObject {
 public:
     static CPen* PASCAL FromHandle(HPEN hPen);
     CPen() = default;
@@ -245,8 +242,7 @@ public:
     int GetLogPen(LOGPEN* pLogPen) const;
 };
 
-class AFX_FRAMEWORK_CLASS CBrush : public CGdiObject
-{
+class AFX_FRAMEWORK_CLASS CBrush : public CGdiObject {
 public:
     static CBrush* PASCAL FromHandle(HBRUSH hBrush);
     CBrush() = default;
@@ -264,8 +260,7 @@ public:
     int GetLogBrush(LOGBRUSH* pLogBrush) const;
 };
 
-class AFX_FRAMEWORK_CLASS CFont : public CGdiObject
-{
+class AFX_FRAMEWORK_CLASS CFont : public CGdiObject {
 public:
     static CFont* PASCAL FromHandle(HFONT hFont);
     CFont() = default;
@@ -281,8 +276,7 @@ public:
     int GetLogFont(LOGFONT* pLogFont);
 };
 
-class AFX_FRAMEWORK_CLASS CRgn : public CGdiObject
-{
+class AFX_FRAMEWORK_CLASS CRgn : public CGdiObject {
 public:
     static CRgn* PASCAL FromHandle(HRGN hRgn);
     CRgn() = default;
@@ -316,8 +310,7 @@ public:
 // device capabilities, text metrics and text extents, from m_hAttribDC. A CDC
 // that created or attached its DC deletes it in its destructor (DeleteDC);
 // Detach gives the DC up.
-class AFX_FRAMEWORK_CLASS CDC : public CObject
-{
+class AFX_FRAMEWORK_CLASS CDC : public CObject {
 public:
     HDC m_hDC = NULL;
     HDC m_hAttribDC = NULL;
@@ -364,8 +357,8 @@ public:
     CBrush* SelectObject(CBrush* pBrush);
     virtual CFont* SelectObject(CFont* pFont);
     CGdiObject* SelectObject(CGdiObject* pObject);
-    int SelectObject(CRgn* pRgn);  // the region type, as SelectClipRgn
-    HGDIOBJ SelectObject(HGDIOBJ hObject);  // not for regions
+    int SelectObject(CRgn* pRgn);          // the region type, as SelectClipRgn
+    HGDIOBJ SelectObject(HGDIOBJ hObject); // not for regions
 
     // Colours and modes
     COLORREF GetBkColor() const;
@@ -465,12 +458,11 @@ public:
 };
 
 // BeginPaint on construction, EndPaint on destruction.
-class AFX_FRAMEWORK_CLASS CPaintDC : public CDC
-{
+class AFX_FRAMEWORK_CLASS CPaintDC : public CDC {
 public:
     PAINTSTRUCT m_ps = {};
 
-    explicit CPaintDC(CWnd* pWnd);  // throws CResourceException* if BeginPaint fails
+    explicit CPaintDC(CWnd* pWnd); // throws CResourceException* if BeginPaint fails
     ~CPaintDC() override;
 
 protected:
@@ -479,10 +471,9 @@ protected:
 
 // GetDC on construction, ReleaseDC on destruction; a NULL window gives the
 // screen's DC.
-class AFX_FRAMEWORK_CLASS CClientDC : public CDC
-{
+class AFX_FRAMEWORK_CLASS CClientDC : public CDC {
 public:
-    explicit CClientDC(CWnd* pWnd);  // throws CResourceException* if GetDC fails
+    explicit CClientDC(CWnd* pWnd); // throws CResourceException* if GetDC fails
     ~CClientDC() override;
 
 protected:
@@ -499,8 +490,7 @@ protected:
 // object is detached when the window is destroyed (WM_NCDESTROY), after
 // which PostNcDestroy runs. Destroying an object whose window still exists
 // destroys the window.
-class AFX_FRAMEWORK_CLASS CWnd : public CCmdTarget
-{
+class AFX_FRAMEWORK_CLASS CWnd : public CCmdTarget {
 public:
     HWND m_hWnd = NULL;
 
@@ -657,7 +647,7 @@ public:
     LRESULT Default();
 
 protected:
-    explicit CWnd(HWND hWnd) : m_hWnd(hWnd) { }
+    explicit CWnd(HWND hWnd) : m_hWnd(hWnd) {}
 
     // Default handlers: each passes the current message to Default().
     afx_msg int OnCreate(LPCREATESTRUCT lpCreateStruct);
@@ -699,7 +689,7 @@ protected:
     afx_msg void OnCancelMode();
     afx_msg UINT OnGetDlgCode();
 
-    WNDPROC m_pfnSuper = NULL;  // the window procedure before subclassing
+    WNDPROC m_pfnSuper = NULL; // the window procedure before subclassing
 
     DECLARE_MESSAGE_MAP()
 };
@@ -726,8 +716,7 @@ AFX_FRAMEWORK_API BOOL AFXAPI AfxUnlockTempMaps(BOOL bDeleteTemps = TRUE);
 // Controls and dialogs
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CScrollBar : public CWnd
-{
+class AFX_FRAMEWORK_CLASS CScrollBar : public CWnd {
 public:
     CScrollBar() = default;
     ~CScrollBar() override = default;
@@ -748,8 +737,7 @@ private:
     using CWnd::Create;
 };
 
-class AFX_FRAMEWORK_CLASS CButton : public CWnd
-{
+class AFX_FRAMEWORK_CLASS CButton : public CWnd {
 public:
     CButton() = default;
     ~CButton() override = default;
@@ -770,8 +758,7 @@ private:
 // The base of dialog classes. Dialogs here are shown by the common dialogs
 // (CPrintDialog::DoModal), which attach the CDialog to the real dialog window
 // while it exists and call OnInitDialog when it initialises.
-class AFX_FRAMEWORK_CLASS CDialog : public CWnd
-{
+class AFX_FRAMEWORK_CLASS CDialog : public CWnd {
 public:
     ~CDialog() override = default;
     // Called once the dialog and its controls exist. TRUE lets the dialog set
@@ -780,23 +767,22 @@ public:
     void EndDialog(int nResult);
 
 protected:
-    explicit CDialog(CWnd* pParentWnd = NULL) : m_pParentWnd(pParentWnd) { }
-    CWnd* m_pParentWnd = NULL;  // not owned
+    explicit CDialog(CWnd* pParentWnd = NULL) : m_pParentWnd(pParentWnd) {}
+    CWnd* m_pParentWnd = NULL; // not owned
 };
 
 // ---------------------------------------------------------------------------
 // Threads and the application
 // ---------------------------------------------------------------------------
 
-class AFX_FRAMEWORK_CLASS CWinThread : public CCmdTarget
-{
+class AFX_FRAMEWORK_CLASS CWinThread : public CCmdTarget {
 public:
-    CWnd* m_pMainWnd = NULL;  // not owned; its destruction ends Run
-    CWnd* m_pActiveWnd = NULL;  // not owned
+    CWnd* m_pMainWnd = NULL;   // not owned; its destruction ends Run
+    CWnd* m_pActiveWnd = NULL; // not owned
     BOOL m_bAutoDelete = FALSE;
     HANDLE m_hThread = NULL;
     DWORD m_nThreadID = 0;
-    MSG m_msgCur = {};  // the message being pumped
+    MSG m_msgCur = {}; // the message being pumped
 
     CWinThread();
     ~CWinThread() override = default;
@@ -820,12 +806,11 @@ public:
     virtual BOOL IsIdleMessage(MSG* pMsg);
 
 private:
-    CPoint m_ptCursorLast {-1, -1};
+    CPoint m_ptCursorLast{-1, -1};
     UINT m_nMsgLast = 0;
 };
 
-class AFX_FRAMEWORK_CLASS CWinApp : public CWinThread
-{
+class AFX_FRAMEWORK_CLASS CWinApp : public CWinThread {
 public:
     LPCTSTR m_pszAppName = NULL;
     HINSTANCE m_hInstance = NULL;
@@ -880,8 +865,7 @@ AFX_FRAMEWORK_API BOOL AFXAPI AfxPumpMessage();
 
 // One link of the chain of libraries searched for resources. Constructing it
 // puts it at the front of the chain; destroying it takes it out.
-class AFX_FRAMEWORK_CLASS CDynLinkLibrary : public CCmdTarget
-{
+class AFX_FRAMEWORK_CLASS CDynLinkLibrary : public CCmdTarget {
 public:
     explicit CDynLinkLibrary(AFX_EXTENSION_MODULE& state, BOOL bSystem = FALSE);
     CDynLinkLibrary(HINSTANCE hModule, HINSTANCE hResource);
@@ -890,7 +874,7 @@ public:
     HMODULE m_hModule = NULL;
     HMODULE m_hResource = NULL;
     BOOL m_bSystem = FALSE;
-    CDynLinkLibrary* m_pNextDLL = NULL;  // the next link of the chain, not owned
+    CDynLinkLibrary* m_pNextDLL = NULL; // the next link of the chain, not owned
 };
 
-#endif  // TAVO_FRAMEWORK_AFXWIN_H
+#endif // TAVO_FRAMEWORK_AFXWIN_H

@@ -21,8 +21,8 @@ constexpr const char* kImeWindowClass = "IME";
 // One kind of handle map: objects attached to handles for good (permanent)
 // and wrapper objects made on demand for handles nobody attached
 // (temporary, owned by the map and deleted by DeleteTemporaries).
-template <class Object> class HandleMap
-{
+template <class Object>
+class HandleMap {
 public:
     Object* LookupPermanent(HANDLE h) const
     {
@@ -44,7 +44,8 @@ public:
     void AddTemporary(HANDLE h, Object* object) { m_temporary[h] = object; }
     // Deletes every temporary object after releaseHandle has cleared its
     // handle, so that its destructor leaves the Windows object alone.
-    template <class ReleaseHandle> void DeleteTemporaries(ReleaseHandle releaseHandle)
+    template <class ReleaseHandle>
+    void DeleteTemporaries(ReleaseHandle releaseHandle)
     {
         auto temporaries = std::move(m_temporary);
         m_temporary.clear();
@@ -101,6 +102,6 @@ LRESULT CallWindowProcedure(CWnd* pWnd, HWND hWnd, UINT nMsg, WPARAM wParam, LPA
 // procedure; used at WM_NCDESTROY.
 void DetachDestroyedWindow(CWnd* pWnd);
 
-}  // namespace afx_internal
+} // namespace afx_internal
 
-#endif  // TAVO_FRAMEWORK_AFX_INTERNAL_H
+#endif // TAVO_FRAMEWORK_AFX_INTERNAL_H

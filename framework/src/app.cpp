@@ -4,8 +4,8 @@
 #include <afxdlgs.h>
 
 namespace {
-CWinApp* g_currentApp = NULL;  // not owned
-}  // namespace
+CWinApp* g_currentApp = NULL; // not owned
+} // namespace
 
 CWinApp* AfxGetApp() { return g_currentApp; }
 

@@ -5,7 +5,7 @@
 namespace {
 constexpr const char* kScrollBarClass = "SCROLLBAR";
 constexpr const char* kButtonClass = "BUTTON";
-}  // namespace
+} // namespace
 
 // CScrollBar
 

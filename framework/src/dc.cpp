@@ -6,7 +6,8 @@ namespace {
 
 // Applies an attribute change to the output handle (when it differs) and
 // to the attribute handle, returning the attribute handle's answer.
-template <class Result, class Change> Result SetOnBoth(HDC output, HDC attribute, Result fallback, Change change)
+template <class Result, class Change>
+Result SetOnBoth(HDC output, HDC attribute, Result fallback, Change change)
 {
     Result result = fallback;
     if (output != attribute && output != NULL)
@@ -19,7 +20,7 @@ template <class Result, class Change> Result SetOnBoth(HDC output, HDC attribute
 // The handle to read attributes from: the attribute handle, else the output.
 HDC ReadHandle(const CDC& dc) { return dc.m_hAttribDC != NULL ? dc.m_hAttribDC : dc.m_hDC; }
 
-}  // namespace
+} // namespace
 
 CDC::~CDC()
 {
@@ -59,7 +60,7 @@ int CDC::SaveDC()
     if (m_hAttribDC != NULL)
         saved = ::SaveDC(m_hAttribDC);
     if (m_hDC != m_hAttribDC && ::SaveDC(m_hDC) != 0)
-        saved = -1;  // -1: restore the latest of both
+        saved = -1; // -1: restore the latest of both
     return saved;
 }
 

@@ -32,7 +32,7 @@ CGdiObject* NewTemporaryGdiObject(HGDIOBJ hObject)
     }
 }
 
-}  // namespace
+} // namespace
 
 // The state outlives the thread's other thread-local and static objects:
 // windows and DCs held by globals may still reach it while the process
@@ -71,7 +71,7 @@ CGdiObject* GdiObjectFromHandle(HGDIOBJ hObject)
     return created;
 }
 
-}  // namespace afx_internal
+} // namespace afx_internal
 
 void AfxLockTempMaps() { ++CurrentThreadState().tempMapLocks; }
 
@@ -99,7 +99,7 @@ CWnd* CWnd::FromHandle(HWND hWnd)
     if (CWnd* permanent = map.LookupPermanent(hWnd))
         return permanent;
     if (CWnd* temporary = map.LookupTemporary(hWnd)) {
-        temporary->m_hWnd = hWnd;  // a temporary may have been used to destroy the window
+        temporary->m_hWnd = hWnd; // a temporary may have been used to destroy the window
         return temporary;
     }
     CWnd* created = new CWnd;
@@ -123,7 +123,7 @@ BOOL CWnd::Attach(HWND hWndNew)
         return FALSE;
     auto& map = CurrentThreadState().windows;
     if (map.LookupPermanent(hWndNew) != NULL)
-        return FALSE;  // another object has it
+        return FALSE; // another object has it
     m_hWnd = hWndNew;
     map.SetPermanent(hWndNew, this);
     return TRUE;

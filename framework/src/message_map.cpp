@@ -129,7 +129,7 @@ LRESULT CallHandler(CWnd* pWnd, const AFX_MSGMAP_ENTRY& entry, WPARAM wParam, LP
 }
 PTM_WARNING_RESTORE
 
-}  // namespace
+} // namespace
 
 BOOL CWnd::OnWndMsg(UINT message, WPARAM wParam, LPARAM lParam, LRESULT* pResult)
 {

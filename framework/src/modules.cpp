@@ -7,7 +7,7 @@
 
 namespace {
 
-constexpr UINT kStringsPerBlock = 16;  // string resources come in blocks of 16
+constexpr UINT kStringsPerBlock = 16; // string resources come in blocks of 16
 
 // The chain is built at library load, possibly on a loader thread, and read
 // by the user-interface thread.
@@ -17,8 +17,8 @@ std::mutex& ChainMutex()
     return mutex;
 }
 
-CDynLinkLibrary* g_firstLibrary = NULL;  // the chain, newest first; links not owned
-HINSTANCE g_resourceHandle = NULL;  // NULL: follow the instance handle
+CDynLinkLibrary* g_firstLibrary = NULL; // the chain, newest first; links not owned
+HINSTANCE g_resourceHandle = NULL;      // NULL: follow the instance handle
 
 bool HasResource(HINSTANCE hInst, LPCSTR lpszName, LPCSTR lpszType)
 {
@@ -61,7 +61,8 @@ std::vector<HMODULE> ChainInSearchOrder()
     return modules;
 }
 
-template <class Has> HINSTANCE FindInChain(Has has)
+template <class Has>
+HINSTANCE FindInChain(Has has)
 {
     const HINSTANCE resourceHandle = AfxGetResourceHandle();
     if (has(resourceHandle))
@@ -92,7 +93,7 @@ void RemoveFromChain(CDynLinkLibrary* link)
     }
 }
 
-}  // namespace
+} // namespace
 
 HINSTANCE AfxGetInstanceHandle()
 {
@@ -147,7 +148,7 @@ void AfxTermExtensionModule(AFX_EXTENSION_MODULE& state, BOOL bAll)
         }
         if (victim == NULL)
             break;
-        delete victim;  // its destructor takes it out of the chain
+        delete victim; // its destructor takes it out of the chain
     }
 }
 

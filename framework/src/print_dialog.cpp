@@ -34,7 +34,7 @@ UINT_PTR CALLBACK PrintDialogHook(HWND hDlg, UINT message, WPARAM, LPARAM)
 struct DevNamesView {
     explicit DevNamesView(HGLOBAL hDevNames)
         : m_handle(hDevNames), m_names(static_cast<const DEVNAMES*>(hDevNames ? ::GlobalLock(hDevNames) : NULL))
-    { }
+    {}
     ~DevNamesView()
     {
         if (m_names != NULL)
@@ -52,7 +52,7 @@ private:
     const DEVNAMES* m_names;
 };
 
-}  // namespace
+} // namespace
 
 CPrintDialog::CPrintDialog(BOOL bPrintSetupOnly, DWORD dwFlags, CWnd* pParentWnd) : CCommonDialog(pParentWnd), m_pd()
 {
@@ -65,7 +65,7 @@ CPrintDialog::CPrintDialog(BOOL bPrintSetupOnly, DWORD dwFlags, CWnd* pParentWnd
     } else {
         m_pd.Flags |= PD_RETURNDC | PD_ENABLEPRINTHOOK;
     }
-    m_pd.Flags &= ~static_cast<DWORD>(PD_RETURNIC);  // information contexts are not offered
+    m_pd.Flags &= ~static_cast<DWORD>(PD_RETURNIC); // information contexts are not offered
 }
 
 INT_PTR CPrintDialog::DoModal()

@@ -4,7 +4,7 @@
 namespace {
 constexpr DWORD kPrintInfoDialogFlags = PD_ALLPAGES | PD_USEDEVMODECOPIES | PD_NOSELECTION;
 constexpr UINT kLastPossiblePage = 0xFFFF;
-}  // namespace
+} // namespace
 
 CPrintInfo::CPrintInfo() : m_pPD(new CPrintDialog(FALSE, kPrintInfoDialogFlags))
 {

@@ -14,7 +14,7 @@ int ClampIndex(int value, int length) { return std::max(0, std::min(value, lengt
 
 int Sign(int value) { return value < 0 ? -1 : (value > 0 ? 1 : 0); }
 
-}  // namespace
+} // namespace
 
 CString::CString(LPCSTR lpsz)
 {

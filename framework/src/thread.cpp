@@ -8,9 +8,9 @@ namespace {
 // count as activity that restarts idle processing.
 constexpr UINT kSystemTimerMessage = 0x0118;
 
-}  // namespace
+} // namespace
 
-CWinThread::CWinThread() : m_nThreadID(::GetCurrentThreadId()) { }
+CWinThread::CWinThread() : m_nThreadID(::GetCurrentThreadId()) {}
 
 CWnd* CWinThread::GetMainWnd() { return m_pMainWnd; }
 
@@ -67,7 +67,7 @@ BOOL CWinThread::PreTranslateMessage(MSG* pMsg)
 BOOL CWinThread::OnIdle(LONG lCount)
 {
     if (lCount <= 0)
-        return TRUE;  // one more round, then the clean-up
+        return TRUE; // one more round, then the clean-up
     AfxLockTempMaps();
     AfxUnlockTempMaps(TRUE);
     return FALSE;

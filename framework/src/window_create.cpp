@@ -52,8 +52,7 @@ bool IsImeWindow(HWND hWnd)
 void InstallFrameworkProcedure(CWnd* pWnd, HWND hWnd)
 {
     const WNDPROC frameworkProc = AfxGetAfxWndProc();
-    const auto previous
-        = reinterpret_cast<WNDPROC>(::SetWindowLongPtrA(hWnd, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(frameworkProc)));
+    const auto previous = reinterpret_cast<WNDPROC>(::SetWindowLongPtrA(hWnd, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(frameworkProc)));
     if (previous != frameworkProc)
         *pWnd->GetSuperWndProcAddr() = previous;
 }
@@ -77,7 +76,7 @@ LRESULT CALLBACK CreationHook(int nCode, WPARAM wParam, LPARAM lParam)
     return ::CallNextHookEx(state.creationHook, nCode, wParam, lParam);
 }
 
-}  // namespace
+} // namespace
 
 namespace afx_internal {
 
@@ -95,9 +94,9 @@ bool RegisterDefaultWindowClass()
 {
     WNDCLASSA wndcls = {};
     wndcls.style = CS_DBLCLKS | CS_HREDRAW | CS_VREDRAW;
-    wndcls.lpfnWndProc = ::DefWindowProcA;  // replaced by AfxWndProc at creation
+    wndcls.lpfnWndProc = ::DefWindowProcA; // replaced by AfxWndProc at creation
     wndcls.hInstance = AfxGetInstanceHandle();
-    wndcls.hCursor = ::LoadCursorA(NULL, MAKEINTRESOURCEA(32512));  // IDC_ARROW
+    wndcls.hCursor = ::LoadCursorA(NULL, MAKEINTRESOURCEA(32512)); // IDC_ARROW
     wndcls.lpszClassName = kDefaultWindowClass;
     return AfxRegisterClass(&wndcls) != FALSE;
 }
@@ -127,7 +126,7 @@ LRESULT CallWindowProcedure(CWnd* pWnd, HWND hWnd, UINT nMsg, WPARAM wParam, LPA
 {
     ThreadState& state = CurrentThreadState();
     const MSG previous = state.currentMessage;
-    state.currentMessage = MSG {hWnd, nMsg, wParam, lParam, 0, {0, 0}};
+    state.currentMessage = MSG{hWnd, nMsg, wParam, lParam, 0, {0, 0}};
     LRESULT result = 0;
     try {
         result = pWnd->WindowProc(nMsg, wParam, lParam);
@@ -159,7 +158,7 @@ void DetachDestroyedWindow(CWnd* pWnd)
     pWnd->PostNcDestroy();
 }
 
-}  // namespace afx_internal
+} // namespace afx_internal
 
 LRESULT CALLBACK AfxWndProc(HWND hWnd, UINT nMsg, WPARAM wParam, LPARAM lParam)
 {
@@ -213,7 +212,7 @@ BOOL CWnd::CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowNa
                     int nWidth, int nHeight, HWND hWndParent, HMENU nIDorHMenu, LPVOID lpParam)
 {
     if (m_hWnd != NULL)
-        return FALSE;  // one window per object
+        return FALSE; // one window per object
 
     CREATESTRUCTA cs = {};
     cs.dwExStyle = dwExStyle;
@@ -242,7 +241,7 @@ BOOL CWnd::CreateEx(DWORD dwExStyle, LPCTSTR lpszClassName, LPCTSTR lpszWindowNa
     const HWND hWnd = ::CreateWindowExA(cs.dwExStyle, cs.lpszClass, cs.lpszName, cs.style, cs.x, cs.y, cs.cx, cs.cy,
                                         cs.hwndParent, cs.hMenu, cs.hInstance, cs.lpCreateParams);
     if (!afx_internal::UnhookWindowCreate())
-        PostNcDestroy();  // failed before any message
+        PostNcDestroy(); // failed before any message
     return hWnd != NULL && hWnd == m_hWnd;
 }
 
@@ -256,9 +255,9 @@ BOOL CWnd::PreCreateWindow(CREATESTRUCT& cs)
     return TRUE;
 }
 
-void CWnd::PreSubclassWindow() { }
+void CWnd::PreSubclassWindow() {}
 
-void CWnd::PostNcDestroy() { }
+void CWnd::PostNcDestroy() {}
 
 WNDPROC* CWnd::GetSuperWndProcAddr() { return &m_pfnSuper; }
 
@@ -301,8 +300,7 @@ BOOL CWnd::DestroyWindow()
     // WM_NCDESTROY and may even be deleted by PostNcDestroy: it must not be
     // touched afterwards. Any other object (a temporary, or one attached to
     // a window of another procedure) lets go of the dead window here.
-    const bool detachesItself = FromHandlePermanent(hWnd) == this
-        && reinterpret_cast<WNDPROC>(::GetWindowLongPtrA(hWnd, GWLP_WNDPROC)) == AfxGetAfxWndProc();
+    const bool detachesItself = FromHandlePermanent(hWnd) == this && reinterpret_cast<WNDPROC>(::GetWindowLongPtrA(hWnd, GWLP_WNDPROC)) == AfxGetAfxWndProc();
     const BOOL result = ::DestroyWindow(hWnd);
     if (!detachesItself && m_hWnd == hWnd && !::IsWindow(hWnd))
         Detach();

@@ -13,6 +13,7 @@ TAVO_PACKAGES=(
     xvfb
     ghostscript
     librecad-data
+    clang-format
 )
 
 tavo_step() { printf '\n==> %s\n' "$*"; }
@@ -47,4 +48,20 @@ tavo_build() {
 # Stop the build's Wine environment when the calling script exits.
 tavo_stop_wine_on_exit() {
     trap '"$TAVO_ROOT/scripts/wine-stop" "$TAVO_BUILD_DIR"' EXIT
+}
+
+# Checks that every C++ source the repository tracks is laid out as
+# .clang-format says; lists the files that are not.
+tavo_check_format() {
+    tavo_step "checking the source format (clang-format)"
+    local files
+    mapfile -t files < <(cd "$TAVO_ROOT" && git ls-files '*.cpp' '*.h')
+    if ! (cd "$TAVO_ROOT" && clang-format --dry-run --Werror "${files[@]}" 2>/dev/null); then
+        echo "these files are not formatted (run clang-format -i on them):" >&2
+        (cd "$TAVO_ROOT" && for f in "${files[@]}"; do
+            clang-format --dry-run --Werror "$f" >/dev/null 2>&1 || echo "  $f" >&2
+        done)
+        return 1
+    fi
+    echo "all ${#files[@]} files formatted"
 }

@@ -37,8 +37,7 @@ constexpr BuiltInColor kBuiltInColors[] = {
 
 DWORD RgbOf(const Tavo_WiPaletteEntry& entry)
 {
-    return static_cast<DWORD>(entry.m_red) | (static_cast<DWORD>(entry.m_green) << 8)
-        | (static_cast<DWORD>(entry.m_blue) << 16);
+    return static_cast<DWORD>(entry.m_red) | (static_cast<DWORD>(entry.m_green) << 8) | (static_cast<DWORD>(entry.m_blue) << 16);
 }
 
 // The luminance of a colour as a grey: green, red and blue weighted and added

@@ -22,7 +22,7 @@ CSize ViewExtent(const Tavo_GrMapping& mapping, const CSize& area)
                  Tavo_GrSaturate(Tavo_WiViewMath::ViewSideLength(view.y1, view.y2, area.cy, scale)));
 }
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(Tavo_WiDrawWnd, Tavo_WiScrollWnd)
     ON_WM_WINDOWPOSCHANGED()
@@ -46,7 +46,10 @@ void Tavo_WiDrawWnd::SetDrawingInfo(Tavo_GrDrawing* drawing, int maxZoomLevel, i
                                     int zeroLevelExpansion, unsigned int maxClipWidth,
                                     unsigned int maxClipHeight)
 {
+    // The undo clip box is a view of the old drawing: it goes with the
+    // mapping, so an undo after rebinding does nothing.
     m_mapping.reset();
+    m_undoClipBox = Tavo_GrWRect();
     m_drawing = nullptr;
     if (!drawing)
         return;
@@ -232,7 +235,10 @@ void Tavo_WiDrawWnd::OnExitSizeMove()
     m_sizing = 0;
     if (!m_drawing || !m_mapping || !IsShownWindow())
         return;
+    // Nothing to show while the scrollee has no area (minimised, zero-sized).
     const CSize size = GetScrolleeSize();
+    if (size.cx <= 0 || size.cy <= 0)
+        return;
     const Tavo_GrWRect before = m_mapping->GetWorldClipBox();
     // Zoomed in, the mapping is sized to the new area first, as the next
     // paint would size it: the scale and the top-left world point stay, and

@@ -39,7 +39,7 @@ void ScrollStep(Tavo_WiDrawWnd& wnd, int step, Tavo_WiScroll::Dir positive, Tavo
     wnd.PumpPaintMessages();
 }
 
-}  // namespace
+} // namespace
 
 // ---- apertures ------------------------------------------------------------------------
 
@@ -219,7 +219,7 @@ UINT ButtonUpMessage(UINT button)
     }
 }
 
-}  // namespace
+} // namespace
 
 void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& start)
 {

@@ -47,7 +47,7 @@ bool FetchDefaultPaper(Paper& paper)
     return true;
 }
 
-}  // namespace
+} // namespace
 
 Tavo_WiWin32Surface* Tavo_WiDrawWnd::GetPrintSurface()
 {

@@ -14,7 +14,12 @@ int Clamped(long long value)
     return Tavo_GrSaturate(value);
 }
 
-}  // namespace
+bool IsEmptyArea(const CSize& size)
+{
+    return size.cx <= 0 || size.cy <= 0;
+}
+
+} // namespace
 
 void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPoint* centre, bool force)
 {
@@ -22,22 +27,21 @@ void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPo
         return;
     // Nothing to fit into while the scrollee has no area (minimised, zero-sized).
     const CSize size = GetScrolleeSize();
-    if (size.cx <= 0 || size.cy <= 0)
+    if (IsEmptyArea(size))
         return;
 
     Tavo_GrWRect bounds;
     m_drawing->FetchBounds(bounds);
-    Tavo_GrWRect visible = VisibleWorldRect(size.cx, size.cy);
+    const Tavo_GrTransform& before = m_mapping->GetTransform();
+    const Tavo_GrWRect visible = VisibleWorldRect(size.cx, size.cy);
 
     Tavo_GrWPoint worldCentre;
-    if (centre) {
-        const Tavo_GrTransform& before = m_mapping->GetTransform();
+    if (centre)
         worldCentre = {before.Invertxcoord(centre->x), before.Invertycoord(centre->y)};
-    } else if (GetZoomLevel() == 0.0) {
+    else if (GetZoomLevel() == 0.0)
         worldCentre = Centre(bounds);
-    } else {
+    else
         worldCentre = Centre(visible);
-    }
 
     m_mapping->SetDeviceWindowSize(size.cx, size.cy, force, &worldCentre);
     const int changed = m_mapping->Zoom(type, worldCentre.x, worldCentre.y, amount);
@@ -50,44 +54,52 @@ void Tavo_WiDrawWnd::InternalZoom(Tavo_GrZoom::Type type, int amount, Tavo_GrDPo
         m_mapping->SetWorldClipBox(Offset(shown, static_cast<long long>(worldCentre.x) - now.x,
                                           static_cast<long long>(worldCentre.y) - now.y));
     }
-
-    // The scroll model of the view shown in an area of the given size.
-    const auto derive = [&](const CSize& area) {
-        visible = VisibleWorldRect(area.cx, area.cy);
-        const bool zoomedIn = GetZoomLevel() != 0.0;
-        m_zoomedIn = zoomedIn ? 1 : 0;
-        const double scale = m_mapping->GetTransform().GetScale();
-        const ScrollRange range = ScrollRangeFor(bounds, visible, scale, zoomedIn);
-        SetScrollRange(range.xMin, range.xMax, range.yMin, range.yMax);
-
-        const long long width = ViewSideLength(visible.x1, visible.x2, area.cx, scale);
-        const long long height = ViewSideLength(visible.y1, visible.y2, area.cy, scale);
-        SetScrollDeltas(CSize(Clamped(width / 2), Clamped(height / 2)),
-                        CSize(Clamped(width / 10), Clamped(height / 10)));
-        SetScrollWindowExtent(Clamped(width), Clamped(height));
-        SetScrollPosition(CPoint(visible.x1, visible.y2));
-    };
-    derive(size);
+    DeriveScrollModel(bounds, size);
     SetScrollDone();
-    // Laying out the bars for the new range can change the scrollee's size
-    // (a bar appeared or went): the view is then sized to the area it really
-    // has and the model derived again, the bars staying as they are. Laid
-    // out again they could flip back: a view whose corners round to whole
-    // units may measure a pixel more than its area.
+
+    // Laying out the scroll bars may have shown or hidden one, which gives
+    // the scrollee another size: the model must describe the area that is
+    // left. The mapping keeps its scale and the top-left corner, as the
+    // screen does (at the zero level it fits the drawing again). Only once,
+    // and the bars stay as they are: laid out again they could flip back (a
+    // view of a few units, its corners rounded to whole units, may measure a
+    // pixel more than its area), and the model would describe the wrong area.
     const CSize laidOut = GetScrolleeSize();
-    if (laidOut != size && laidOut.cx > 0 && laidOut.cy > 0) {
+    if (laidOut != size && !IsEmptyArea(laidOut)) {
         m_mapping->SetDeviceWindowSize(laidOut.cx, laidOut.cy, false, nullptr);
-        derive(laidOut);
+        DeriveScrollModel(bounds, laidOut);
     }
 
     if (changed || force)
         ::InvalidateRect(GetScrollee()->GetSafeHwnd(), nullptr, TRUE);
 }
 
+void Tavo_WiDrawWnd::DeriveScrollModel(const Tavo_GrWRect& bounds, const CSize& size)
+{
+    const Tavo_GrWRect visible = VisibleWorldRect(size.cx, size.cy);
+    const bool zoomedIn = GetZoomLevel() != 0.0;
+    m_zoomedIn = zoomedIn ? 1 : 0;
+    const ScrollRange range = ScrollRangeFor(bounds, visible, m_mapping->GetTransform().GetScale(), zoomedIn);
+    SetScrollRange(range.xMin, range.xMax, range.yMin, range.yMax);
+
+    // The view's own size where it reaches beyond the int range and its
+    // corners are cut there.
+    const double scale = m_mapping->GetTransform().GetScale();
+    const long long width = ViewSideLength(visible.x1, visible.x2, size.cx, scale);
+    const long long height = ViewSideLength(visible.y1, visible.y2, size.cy, scale);
+    SetScrollDeltas(CSize(Clamped(width / 2), Clamped(height / 2)), CSize(Clamped(width / 10), Clamped(height / 10)));
+    SetScrollWindowExtent(Clamped(width), Clamped(height));
+    SetScrollPosition(CPoint(visible.x1, visible.y2));
+}
+
 void Tavo_WiDrawWnd::ZoomWindow(Tavo_GrZoom::Type type, int amount, Tavo_WiZoomCenter::Type centre, int x, int y,
                                 bool force)
 {
     if (!force && (!m_mapping || !m_mapping->ChangesZoomLevel(type, amount)))
+        return;
+    // Without a client area there is no view to zoom (InternalZoom would do
+    // nothing); the undo clip box stays as well.
+    if (m_mapping && IsEmptyArea(GetScrolleeSize()))
         return;
 
     Tavo_GrDPoint point;
@@ -107,7 +119,9 @@ void Tavo_WiDrawWnd::ZoomWindow(Tavo_GrZoom::Type type, int amount, Tavo_WiZoomC
 
 void Tavo_WiDrawWnd::ZoomWindow(double level, int x, int y)
 {
-    if (!m_mapping)
+    // Without a client area the mapping must not change behind the scroll
+    // model's back: nothing happens.
+    if (!m_mapping || IsEmptyArea(GetScrolleeSize()))
         return;
     m_undoClipBox = m_mapping->GetWorldClipBox();
     m_mapping->Zoom(level, x, y);
@@ -119,9 +133,17 @@ void Tavo_WiDrawWnd::ZoomWindow(const Tavo_GrWRect& rect)
 {
     if (rect.x1 == rect.x2 || rect.y1 == rect.y2 || !m_mapping)
         return;
-    const double level = m_mapping->GetEnclosingZoomLevel(rect);
     const Tavo_GrWPoint c = Centre(rect);
-    ZoomWindow(level, c.x, c.y);
+    const CSize size = GetScrolleeSize();
+    ZoomWindow(m_mapping->GetEnclosingZoomLevel(rect), c.x, c.y);
+    // The zoom may have shown or hidden the scroll bars, so that the level
+    // was chosen for an area the scrollee no longer has: choose again for
+    // the area it has now, keeping the view before the first zoom for undo.
+    if (GetScrolleeSize() == size)
+        return;
+    const Tavo_GrWRect undo = m_undoClipBox;
+    ZoomWindow(m_mapping->GetEnclosingZoomLevel(rect), c.x, c.y);
+    m_undoClipBox = undo;
 }
 
 bool Tavo_WiDrawWnd::ZoomWindowTest(Tavo_GrZoom::Type type, int amount) const

@@ -16,7 +16,7 @@ void AlignRightEdge(CWnd* button, const CRect& reference)
     button->SetWindowPos(nullptr, 0, 0, reference.right - rect.left, rect.Height(), SWP_NOMOVE | SWP_NOZORDER);
 }
 
-}  // namespace
+} // namespace
 
 Tavo_WiPrintDialog::Tavo_WiPrintDialog(BOOL printSetupOnly, DWORD flags, CWnd* parent)
     : CPrintDialog(printSetupOnly, flags, parent)

@@ -34,11 +34,10 @@ inline int CornerMarkLength(int pageWidth)
 }
 
 // The printer's page, as the layout needs it.
-struct Paper
-{
-    int width = 0;          // HORZRES, pixels
-    int height = 0;         // VERTRES, pixels
-    int textHeight = 0;     // tmHeight of the printer's font
+struct Paper {
+    int width = 0;      // HORZRES, pixels
+    int height = 0;     // VERTRES, pixels
+    int textHeight = 0; // tmHeight of the printer's font
 };
 
 // The layout with one page covering area.
@@ -126,4 +125,4 @@ inline Tavo_GrWRect PageBox(const Tavo_WiPrintLayout& layout, int page)
             Tavo_GrSaturate(first.x2 + c * bw), Tavo_GrSaturate(first.y2 - r * bh)};
 }
 
-}  // namespace Tavo_WiPrintMath
+} // namespace Tavo_WiPrintMath

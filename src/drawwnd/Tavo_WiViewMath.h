@@ -62,8 +62,7 @@ inline Tavo_GrWRect Offset(const Tavo_GrWRect& r, long long dx, long long dy)
 }
 
 // The scroll range of a view, as xMin, xMax, yMin, yMax.
-struct ScrollRange
-{
+struct ScrollRange {
     int xMin = 0;
     int xMax = 0;
     int yMin = 0;
@@ -93,23 +92,24 @@ inline ScrollRange ScrollRangeFor(const Tavo_GrWRect& bounds, const Tavo_GrWRect
 }
 
 // A world delta in device pixels, rounded, with what the rounding left over
-// (rounded minus exact), which the mapping keeps as its error term. A delta
-// beyond the int range saturates; the pixels then all leave the window and
-// are painted anew, so only the rounding to a whole pixel is an error, never
-// the part cut off by the saturation.
-struct DeviceDelta
-{
+// (rounded minus exact), which the mapping keeps as its error term.
+struct DeviceDelta {
     int pixels = 0;
     double error = 0.0;
 };
 
 inline DeviceDelta ToDeviceDelta(long long worldDelta, double scale)
 {
-    const double exact = static_cast<double>(worldDelta) * scale;
-    if (!std::isfinite(exact))
+    if (worldDelta == 0 || !(scale > 0.0))
         return {};
-    const double rounded = exact < 0.0 ? std::ceil(exact - 0.5) : std::floor(exact + 0.5);
-    return {Tavo_GrRound(exact), rounded - exact};
+    const double exact = static_cast<double>(worldDelta) * scale;
+    const int pixels = Tavo_GrRound(exact);
+    // A move beyond the int range uncovers the whole view: no moved pixel
+    // stays to line up with, so no error is kept (it could not be measured
+    // in int pixels anyway).
+    if (!(std::fabs(exact) < static_cast<double>(INT_MAX)))
+        return {pixels, 0.0};
+    return {pixels, pixels - exact};
 }
 
 // A device delta in world units: 0 stays 0, anything else moves at least one
@@ -166,4 +166,4 @@ inline int AutoScrollPercent(int position, int size)
     return std::max(1, Tavo_GrTruncate(ratio * ratio * 10.0));
 }
 
-}  // namespace Tavo_WiViewMath
+} // namespace Tavo_WiViewMath

@@ -9,7 +9,7 @@ namespace {
 // The low ten bits of a locale id are its primary language.
 constexpr LCID PrimaryLanguageMask = 0x3FF;
 
-}  // namespace
+} // namespace
 
 bool UseOwnClasses()
 {
@@ -33,4 +33,4 @@ void RegisterOnce(bool& registered, LPCSTR name, UINT style, HCURSOR cursor, HBR
         AfxThrowResourceException();
 }
 
-}  // namespace Tavo_WiWindowClass
+} // namespace Tavo_WiWindowClass

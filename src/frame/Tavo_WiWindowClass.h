@@ -20,4 +20,4 @@ bool UseOwnClasses();
 // resource exception.
 void RegisterOnce(bool& registered, LPCSTR name, UINT style, HCURSOR cursor, HBRUSH background);
 
-}  // namespace Tavo_WiWindowClass
+} // namespace Tavo_WiWindowClass

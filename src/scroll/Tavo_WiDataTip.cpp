@@ -20,8 +20,8 @@ constexpr char NotifyMessageName[] = "BrymarTavo_WiDataTipMessage";
 // user-interface thread.
 int s_instanceCount = 0;
 HHOOK s_keyboardHook = nullptr;
-int s_keyFlag = 0;                            // a keyboard event has passed the hook
-Tavo_WiDataTip* s_currentTip = nullptr;       // the shown tip, if any; not owned
+int s_keyFlag = 0;                      // a keyboard event has passed the hook
+Tavo_WiDataTip* s_currentTip = nullptr; // the shown tip, if any; not owned
 UINT s_notifyMsg = 0;
 bool s_classRegistered = false;
 
@@ -49,7 +49,7 @@ void CreateSharedObjects()
         s_keyboardHook = SetWindowsHookExA(WH_KEYBOARD, KeyboardHookProc, nullptr, GetCurrentThreadId());
 }
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(Tavo_WiDataTip, CWnd)
     ON_WM_TIMER()

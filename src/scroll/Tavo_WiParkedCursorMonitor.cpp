@@ -51,7 +51,7 @@ bool IsButtonReleaseOrDoubleClick(UINT message)
     }
 }
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(Tavo_WiParkedCursorMonitor, CWnd)
     ON_WM_TIMER()

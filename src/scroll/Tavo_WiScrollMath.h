@@ -76,4 +76,4 @@ inline int RoundedPercentOf(int extent, unsigned int percent, int sign)
     return Tavo_GrRound(sign * static_cast<double>(percent) * extent / 100.0);
 }
 
-}  // namespace Tavo_WiScrollMath
+} // namespace Tavo_WiScrollMath

@@ -23,4 +23,4 @@ extern std::unique_ptr<CBrush> dataTipBrush;
 // scrollee's message map dispatches on it.
 extern UINT parkedCursorNotifyMsg;
 
-}  // namespace Tavo_WiScrollStatics
+} // namespace Tavo_WiScrollStatics

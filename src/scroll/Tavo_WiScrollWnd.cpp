@@ -85,7 +85,7 @@ void ShowChild(CWnd& child, bool visible)
     ::ShowWindow(child.GetSafeHwnd(), visible ? SW_SHOWNORMAL : SW_HIDE);
 }
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(Tavo_WiScrollWnd, CWnd)
     ON_WM_HSCROLL()
@@ -203,7 +203,7 @@ void Tavo_WiScrollWnd::SetScrollPosition(const CPoint& position)
     ::SetScrollPos(m_horzBar.GetSafeHwnd(), SB_CTL, ToBarUnits(m_position.x, m_horzScale), TRUE);
     // In inverted-Y mode the top of the range is at the top of the bar.
     const int barY = m_invertedY ? Tavo_GrSaturate(static_cast<long long>(m_rangeMin.y) - m_position.y +
-                                            m_rangeMax.y)
+                                                   m_rangeMax.y)
                                  : m_position.y;
     ::SetScrollPos(m_vertBar.GetSafeHwnd(), SB_CTL, ToBarUnits(barY, m_vertScale), TRUE);
 }
@@ -368,7 +368,7 @@ void Tavo_WiScrollWnd::OnScroll(Axis axis, UINT code, UINT n, CScrollBar* bar)
         target = flipped ? rangeMax : rangeMin;
         break;
     case SB_BOTTOM:
-        target = flipped ? rangeMin : rangeMax;   // the clamp brings it back by the extent
+        target = flipped ? rangeMin : rangeMax; // the clamp brings it back by the extent
         break;
     case SB_ENDSCROLL:
         EndScrollAction();

@@ -15,7 +15,7 @@ constexpr char ClassName[] = "Tavo_WiScrollee";
 constexpr UINT ClassStyle = CS_DBLCLKS | CS_PARENTDC;
 bool s_classRegistered = false;
 
-}  // namespace
+} // namespace
 
 BEGIN_MESSAGE_MAP(Tavo_WiScrollee, CWnd)
     ON_WM_PAINT()

@@ -1,5 +1,6 @@
 // Tavo_WiWin32Surface: construction, binding to a device context, the mapping
-// of attributes to GDI objects, the end of a pass and the Escape interrupt.
+// of attributes to GDI objects, the start and end of a pass and the Escape
+// interrupt.
 // Batching is in Tavo_WiWin32SurfaceBatching.cpp, the drawing operations in
 // Tavo_WiWin32SurfaceDrawing.cpp, text in Tavo_WiWin32SurfaceText.cpp.
 #include "Tavo_WiWin32Surface.h"
@@ -43,12 +44,12 @@ const unsigned int kLargestFontFloorPixels = 2048;
 UINT ToGdiTextAlign(unsigned char code)
 {
     UINT flags = TA_LEFT;
-    switch (code & 3) {
-    case 2: flags = TA_RIGHT; break;
-    case 3: flags = TA_CENTER; break;
+    switch (code & Tavo_GrAttr::kHorizontalAlignMask) {
+    case Tavo_GrAttr::AlignRight: flags = TA_RIGHT; break;
+    case Tavo_GrAttr::AlignCentre: flags = TA_CENTER; break;
     default: break;
     }
-    return flags | ((code & 12) == 8 ? TA_TOP : TA_BOTTOM);
+    return flags | ((code & Tavo_GrAttr::kVerticalAlignMask) == Tavo_GrAttr::AlignTop ? TA_TOP : TA_BOTTOM);
 }
 
 LOGFONTA DescribeFont(unsigned int pixelHeight)
@@ -82,7 +83,8 @@ Tavo_WiWin32Surface::Tavo_WiWin32Surface()
     if (!m_2array) {
         // Entry n is the length of the count array for n-point polylines.
         const int maxCounts[6] = {
-            0, 0,
+            0,
+            0,
             kDotCapacity > kLineCapacity ? kDotCapacity : kLineCapacity,
             kUniangleCapacity,
             kHollowTriangleCapacity > kFilledTriangleCapacity ? kHollowTriangleCapacity : kFilledTriangleCapacity,
@@ -110,7 +112,7 @@ void Tavo_WiWin32Surface::SetDC(HDC dc)
     // otherwise be lost.
     ReleaseGdiObjects();
     m_hdc = dc;
-    m_textAlign = 5; // left, bottom
+    m_textAlign = Tavo_GrAttr::AlignDefault; // left, bottom
     SetTextAlign(dc, TA_LEFT | TA_BOTTOM);
     SetBkMode(dc, TRANSPARENT);
     SetPolyFillMode(dc, ALTERNATE);
@@ -247,10 +249,26 @@ void Tavo_WiWin32Surface::ForgetGdiObjects()
     m_oldFont = nullptr;
 }
 
+void Tavo_WiWin32Surface::BeginDrawing(const Tavo_GrDrawing* drawing)
+{
+    Tavo_GrSurface::BeginDrawing(drawing);
+    // A pass that starts with Escape held stops at its first poll, however
+    // recently the previous pass asked.
+    m_escapeQueryTick = kNoEscapeQuery;
+}
+
 bool Tavo_WiWin32Surface::PollDrawInterrupt()
 {
     if (IsDrawingInterrupted())
         return true;
+    // Asking the key state is a kernel call on Windows and a round trip to the
+    // server under Wine on a thread that owns a window: asked at every batch
+    // boundary, nine times per flush, it would cost a third of a paint. Once
+    // per clock tick (about 16 ms) is quicker than a person can tell.
+    const ULONGLONG now = GetTickCount64();
+    if (now == m_escapeQueryTick)
+        return false;
+    m_escapeQueryTick = now;
     // The sign bit says the key is down now.
     if (GetAsyncKeyState(VK_ESCAPE) & 0x8000) {
         SetDrawingInterruptedFlag();

@@ -13,7 +13,6 @@
 #pragma push_macro("DrawText")
 #undef DrawText
 
-
 namespace {
 
 void SetPoint(POINT& point, int x, int y)
@@ -196,8 +195,8 @@ void Tavo_WiWin32Surface::FlushDots()
     m_stats.Add(Tavo_GrSurfaceStats::Dots, m_dots.m_count);
     m_dots.m_count = 0;
     // Repeat suppression only spans dots still waiting in the batch.
-    m_lastDotX = -1;
-    m_lastDotY = -1;
+    m_lastDotX = kNoDotSinceEmission;
+    m_lastDotY = kNoDotSinceEmission;
 }
 
 void Tavo_WiWin32Surface::FlushLines()

@@ -9,7 +9,6 @@
 #pragma push_macro("DrawText")
 #undef DrawText
 
-
 namespace {
 
 // Radii that are drawn as a small outlined triangle instead of a circle.
@@ -122,8 +121,7 @@ void Tavo_WiWin32Surface::DrawTriangle(Tavo_GrDPoint points[3], Tavo_GrAttr* att
         return;
     }
     // Only the distances from the first point decide.
-    const bool tiny = IsTinyDifference(p0.x, p1.x) && IsTinyDifference(p0.x, p2.x)
-        && IsTinyDifference(p0.y, p1.y) && IsTinyDifference(p0.y, p2.y);
+    const bool tiny = IsTinyDifference(p0.x, p1.x) && IsTinyDifference(p0.x, p2.x) && IsTinyDifference(p0.y, p1.y) && IsTinyDifference(p0.y, p2.y);
     if (tiny)
         AddUniangle(p0.x, y0, p1.x, y1, p2.x, y2);
     else

@@ -29,11 +29,11 @@ void Tavo_WiWin32Surface::DrawTextPlaceholder(Tavo_GrDPoint anchor, int width, i
 {
     Tavo_GrDPoint start = anchor;
     Tavo_GrDPoint end = anchor;
-    switch (m_textAlign & 3) {
-    case 2: // right
+    switch (m_textAlign & Tavo_GrAttr::kHorizontalAlignMask) {
+    case Tavo_GrAttr::AlignRight:
         start.x = Tavo_GrSubtract(anchor.x, width);
         break;
-    case 3: { // centre
+    case Tavo_GrAttr::AlignCentre: {
         const int half = width / 2;
         start.x = Tavo_GrSubtract(anchor.x, half);
         end.x = Tavo_GrAdd(anchor.x, width - half);
@@ -61,7 +61,8 @@ void Tavo_WiWin32Surface::DrawText(const char* text, Tavo_GrDPoint& point, Tavo_
     TEXTMETRICA metrics = {};
     GetTextMetricsA(m_hdc, &metrics);
     long long y = static_cast<long long>(GetDeviceHeight()) - point.y - metrics.tmDescent;
-    if ((m_textAlign & 12) == 12) // middle: drawn bottom-aligned, half a font lower
+    // Middle alignment is drawn bottom-aligned, half a font lower.
+    if ((m_textAlign & Tavo_GrAttr::kVerticalAlignMask) == Tavo_GrAttr::AlignMiddle)
         y += m_fontHeight / 2;
     TextOutA(m_hdc, point.x, Tavo_GrSaturate(y), text ? text : "", length);
     m_stats.Add(Tavo_GrSurfaceStats::Texts, 1);

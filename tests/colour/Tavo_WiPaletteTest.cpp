@@ -11,11 +11,21 @@ const struct {
     DWORD rgb;
     char textColor;
 } kBuiltIns[16] = {
-    {"black", 0x000000, 7},      {"blue", 0xFF0000, 7},        {"green", 0x00FF00, 0},
-    {"cyan", 0xFFFF00, 0},       {"red", 0x0000FF, 7},         {"magenta", 0xFF00FF, 0},
-    {"yellow", 0x00FFFF, 0},     {"white", 0xFFFFFF, 0},       {"gray", 0xA4A0A0, 0},
-    {"dark_gray", 0x4B4B4B, 7},  {"dark_blue", 0x800000, 7},   {"dark_green", 0x008000, 7},
-    {"dark_cyan", 0x808000, 7},  {"dark_red", 0x000080, 7},    {"dark_magenta", 0x800080, 7},
+    {"black", 0x000000, 7},
+    {"blue", 0xFF0000, 7},
+    {"green", 0x00FF00, 0},
+    {"cyan", 0xFFFF00, 0},
+    {"red", 0x0000FF, 7},
+    {"magenta", 0xFF00FF, 0},
+    {"yellow", 0x00FFFF, 0},
+    {"white", 0xFFFFFF, 0},
+    {"gray", 0xA4A0A0, 0},
+    {"dark_gray", 0x4B4B4B, 7},
+    {"dark_blue", 0x800000, 7},
+    {"dark_green", 0x008000, 7},
+    {"dark_cyan", 0x808000, 7},
+    {"dark_red", 0x000080, 7},
+    {"dark_magenta", 0x800080, 7},
     {"olive", 0x286450, 7},
 };
 
@@ -46,11 +56,13 @@ TEST_F(PaletteTest, UserNameLookups)
         const char* name;
         char index;
     } rows[] = {
-        {"grey", 8}, {"Grey", 8}, {"GREY", 8}, {"Dark Red", 13}, {"dark-gray", 9},
-        {"darkgray", 42}, {"reddish", 42}, // separators matter, and the whole name
+        {"grey", 8}, {"Grey", 8}, {"GREY", 8}, {"Dark Red", 13}, {"dark-gray", 9}, {"darkgray", 42}, {"reddish", 42}, // separators matter, and the whole name
         // Special names never reach the table.
-        {"DEFAULT", -3}, {"Inherit", -2}, {"transparent", -1},
-        {"mauve", 42}, {nullptr, 42}, // the caller's default
+        {"DEFAULT", -3},
+        {"Inherit", -2},
+        {"transparent", -1},
+        {"mauve", 42},
+        {nullptr, 42}, // the caller's default
     };
     for (const auto& row : rows)
         EXPECT_EQ(m_palette.GetUserNamedColor(row.name, 42), row.index) << (row.name ? row.name : "(null)");

@@ -26,7 +26,7 @@ public:
     std::vector<Call> m_calls;
     int m_items = 0; // drawing operations received
     int m_attrChanges = 0;
-    int m_interruptAtPoll = 0;   // PollDrawInterrupt reports an interrupt from this poll on (0: never)
+    int m_interruptAtPoll = 0;    // PollDrawInterrupt reports an interrupt from this poll on (0: never)
     int m_interruptAfterItem = 0; // the surface sets the interrupted flag itself after this item (0: never)
 
     // The operations received, separated by spaces, leaving out those named skip.
@@ -51,12 +51,36 @@ public:
     void DrawText(const char* text, Tavo_GrDPoint& point, Tavo_GrAttr* attr) override { Item(attr, "Text", {point}, 0, text); }
     void DrawTriangle(Tavo_GrDPoint p[3], Tavo_GrAttr* attr) override { Item(attr, "Triangle", {p[0], p[1], p[2]}); }
 
-    void Flush() override { Tavo_GrSurface::Flush(); Note("Flush"); }
-    void OnAttrChange() override { Tavo_GrSurface::OnAttrChange(); ++m_attrChanges; }
-    void BeginDrawing(const Tavo_GrDrawing* drawing) override { Tavo_GrSurface::BeginDrawing(drawing); Note("BeginDrawing"); }
-    void EndDrawing() override { Tavo_GrSurface::EndDrawing(); Note("EndDrawing"); }
-    void BeginLayer(const Tavo_GrLayer* layer) override { Tavo_GrSurface::BeginLayer(layer); Note("BeginLayer"); }
-    void EndLayer() override { Tavo_GrSurface::EndLayer(); Note("EndLayer"); }
+    void Flush() override
+    {
+        Tavo_GrSurface::Flush();
+        Note("Flush");
+    }
+    void OnAttrChange() override
+    {
+        Tavo_GrSurface::OnAttrChange();
+        ++m_attrChanges;
+    }
+    void BeginDrawing(const Tavo_GrDrawing* drawing) override
+    {
+        Tavo_GrSurface::BeginDrawing(drawing);
+        Note("BeginDrawing");
+    }
+    void EndDrawing() override
+    {
+        Tavo_GrSurface::EndDrawing();
+        Note("EndDrawing");
+    }
+    void BeginLayer(const Tavo_GrLayer* layer) override
+    {
+        Tavo_GrSurface::BeginLayer(layer);
+        Note("BeginLayer");
+    }
+    void EndLayer() override
+    {
+        Tavo_GrSurface::EndLayer();
+        Note("EndLayer");
+    }
     bool PollDrawInterrupt() override
     {
         if (++m_polls >= m_interruptAtPoll && m_interruptAtPoll > 0)

@@ -76,8 +76,15 @@ TEST(Strings, AToIReadsDecimalTextAndSaturates)
         const char* text;
         int value;
     } rows[] = {
-        {"12", 12}, {"  -7px", -7}, {"+3", 3}, {"abc", 0}, {"", 0}, {nullptr, 0},
-        {"99999999999999999999", INT_MAX}, {"-2147483648", INT_MIN}, {"-99999999999", INT_MIN},
+        {"12", 12},
+        {"  -7px", -7},
+        {"+3", 3},
+        {"abc", 0},
+        {"", 0},
+        {nullptr, 0},
+        {"99999999999999999999", INT_MAX},
+        {"-2147483648", INT_MIN},
+        {"-99999999999", INT_MIN},
     };
     for (const auto& row : rows)
         EXPECT_EQ(UT_STR::AToI(row.text), row.value) << (row.text ? row.text : "(null)");

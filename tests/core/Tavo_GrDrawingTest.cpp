@@ -112,8 +112,7 @@ TEST_F(DrawingTest, BoundsCoverEveryItemAndInvalidItemsAndCyclesAreRefused)
     EXPECT_EQ(m_drawing.GetBounds(), (Tavo_GrWRect{-30, -20, 120, 60}));
 
     const Tavo_GrWPoint two[2] = {{0, 0}, {1, 1}};
-    EXPECT_FALSE(m_build.AddPolyline(1, two) || m_build.AddPolyline(2, nullptr) || m_build.AddPolygon(2, two)
-                 || m_build.AddCall(nullptr, 0, 0) || m_build.AddCall(&m_drawing, 0, 0));
+    EXPECT_FALSE(m_build.AddPolyline(1, two) || m_build.AddPolyline(2, nullptr) || m_build.AddPolygon(2, two) || m_build.AddCall(nullptr, 0, 0) || m_build.AddCall(&m_drawing, 0, 0));
     EXPECT_EQ(m_drawing.GetItemCount(), 3);
     Tavo_GrDrawing b;
     Tavo_GrDrawing c;

@@ -48,8 +48,7 @@ TEST(SurfacePolygon, AFilledPolygonBecomesTrianglesCoveringIt)
     };
     const Row rows[] = {
         {"square", {{0, 0}, {10, 0}, {10, 10}, {0, 10}}, "Triangle Triangle", 200},
-        {"concave L, cut into ears", {{0, 0}, {20, 0}, {20, 10}, {10, 10}, {10, 20}, {0, 20}},
-         "Triangle Triangle Triangle Triangle", 600},
+        {"concave L, cut into ears", {{0, 0}, {20, 0}, {20, 10}, {10, 10}, {10, 20}, {0, 20}}, "Triangle Triangle Triangle Triangle", 600},
     };
     for (const Row& row : rows) {
         SCOPED_TRACE(row.name);
@@ -61,8 +60,7 @@ TEST(SurfacePolygon, AFilledPolygonBecomesTrianglesCoveringIt)
         long long twiceArea = 0;
         for (const RecordingSurface::Call& call : surface.m_calls) {
             const auto& p = call.points;
-            twiceArea += std::llabs(static_cast<long long>(p[1].x - p[0].x) * (p[2].y - p[0].y)
-                                    - static_cast<long long>(p[1].y - p[0].y) * (p[2].x - p[0].x));
+            twiceArea += std::llabs(static_cast<long long>(p[1].x - p[0].x) * (p[2].y - p[0].y) - static_cast<long long>(p[1].y - p[0].y) * (p[2].x - p[0].x));
         }
         EXPECT_EQ(twiceArea, row.twiceArea);
     }

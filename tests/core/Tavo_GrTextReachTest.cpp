@@ -14,8 +14,7 @@ namespace {
 
 bool Within(const Tavo_GrWRect& inner, const Tavo_GrWRect& bounds, const Tavo_GrWPoint& reach)
 {
-    return inner.x1 >= bounds.x1 - reach.x && inner.y1 >= bounds.y1 - reach.y && inner.x2 <= bounds.x2 + reach.x
-        && inner.y2 <= bounds.y2 + reach.y;
+    return inner.x1 >= bounds.x1 - reach.x && inner.y1 >= bounds.y1 - reach.y && inner.x2 <= bounds.x2 + reach.x && inner.y2 <= bounds.y2 + reach.y;
 }
 
 TEST(TextReach, AtTheFloorTextIsAsLongAndHighAsAtThatCharacterHeight)

@@ -19,26 +19,25 @@ namespace DrawWndTest {
 // A drawing window with its own on-screen surface (switched off with
 // useSurface) that notes the application notifications it receives, and the
 // ends of drags.
-class TestDrawWnd : public Tavo_WiDrawWnd
-{
+class TestDrawWnd : public Tavo_WiDrawWnd {
 public:
-    struct Note
-    {
+    struct Note {
         std::string name;
         UINT button = 0;
         UINT flags = 0;
         Tavo_GrWRect rect;
-        HWND capture = nullptr;     // the window holding the mouse capture at the call
+        HWND capture = nullptr; // the window holding the mouse capture at the call
     };
 
     Tavo_WiNativeWindowSurface surface;
     bool useSurface = true;
-    Tavo_WiWin32Surface* printSurface = nullptr;    // handed out by GetPrintSurface; not owned
+    Tavo_WiWin32Surface* printSurface = nullptr; // handed out by GetPrintSurface; not owned
     std::vector<Note> notes;
     DragAction dragAction = Pan;
     CString dataTipText;
-    int paints = 0;     // passes of the full paint path that reached the drawing
-    std::function<void()> onPaint;  // run at each of those passes, before the drawing
+    int paints = 0;                // passes of the full paint path that reached the drawing
+    Tavo_GrDRect lastPaintRect;    // the device rectangle the last of them repainted
+    std::function<void()> onPaint; // run at each of those passes, before the drawing
 
     Tavo_WiNativeWindowSurface* GetNativeWindowSurface() override { return useSurface ? &surface : nullptr; }
     Tavo_WiWin32Surface* GetPrintSurface() override { return printSurface; }
@@ -60,6 +59,7 @@ protected:
                 Tavo_GrMapping* mapping, Tavo_GrDRect& rect) override
     {
         ++paints;
+        lastPaintRect = rect;
         if (onPaint)
             onPaint();
         Tavo_WiDrawWnd::OnDraw(scrollee, dc, drawing, s, mapping, rect);
@@ -96,8 +96,7 @@ private:
 };
 
 // A shown top-level host with a drawing window filling a client rectangle.
-struct HostedDrawWnd
-{
+struct HostedDrawWnd {
     explicit HostedDrawWnd(const CRect& clientRect = CRect(0, 0, 500, 400),
                            const CRect& hostRect = CRect(50, 50, 650, 550));
     ~HostedDrawWnd();
@@ -121,7 +120,24 @@ void AddFilledRect(Tavo_GrDrawing& drawing, const Tavo_GrWRect& rect, char colou
 // Paints every pending update of the window at once.
 void PaintNow(HWND window);
 
-}  // namespace DrawWndTest
+// The bounding box of a window's pending update region, in its client
+// coordinates; empty when nothing waits to be painted.
+CRect PendingUpdate(HWND window);
+
+// A window's client area as on screen, row by row from the top, 0x00RRGGBB.
+struct ClientPicture {
+    int width = 0;
+    int height = 0;
+    std::vector<unsigned int> pixels;
+
+    unsigned int At(int x, int y) const { return pixels[static_cast<size_t>(y) * width + x]; }
+};
+ClientPicture Snapshot(HWND window);
+// How many pixels of two pictures of the same size differ (all of them when
+// the sizes differ).
+long DifferingPixels(const ClientPicture& a, const ClientPicture& b);
+
+} // namespace DrawWndTest
 
 inline void PrintTo(const Tavo_GrWRect& r, std::ostream* out)
 {

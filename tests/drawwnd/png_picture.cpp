@@ -8,8 +8,7 @@ namespace DrawWndTest {
 namespace {
 
 // COM on this thread while a file is read.
-class ComScope
-{
+class ComScope {
 public:
     ComScope() : m_result(::CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED)) {}
     ~ComScope()
@@ -24,7 +23,7 @@ private:
     HRESULT m_result;
 };
 
-}  // namespace
+} // namespace
 
 bool ReadPng(const std::string& path, Picture& picture)
 {
@@ -56,4 +55,4 @@ bool ReadPng(const std::string& path, Picture& picture)
     return true;
 }
 
-}  // namespace DrawWndTest
+} // namespace DrawWndTest

@@ -9,11 +9,10 @@
 
 namespace DrawWndTest {
 
-struct Picture
-{
+struct Picture {
     int width = 0;
     int height = 0;
-    std::vector<COLORREF> pixels;   // rows top to bottom
+    std::vector<COLORREF> pixels; // rows top to bottom
 
     // The pixel, or CLR_INVALID outside the picture.
     COLORREF At(int x, int y) const
@@ -25,4 +24,4 @@ struct Picture
 // Reads a PNG file; false when it cannot be read.
 bool ReadPng(const std::string& path, Picture& picture);
 
-}  // namespace DrawWndTest
+} // namespace DrawWndTest

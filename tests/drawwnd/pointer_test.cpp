@@ -63,8 +63,7 @@ POINT ScreenPoint(HWND window, const CPoint& client)
 // paint it does not carry out, or waiting after taking a quit): past the
 // deadline another thread releases every button, so the test fails instead
 // of hanging. A loop that behaves ends long before.
-class LoopDeadline
-{
+class LoopDeadline {
 public:
     LoopDeadline()
     {
@@ -97,8 +96,7 @@ private:
 // units, red on the left half, white on the right. Bound, the zero level
 // shows one unit per pixel: the client point (x, y) is the world point
 // (x, 400 - y).
-class DrawWndPointerTest : public ::testing::Test
-{
+class DrawWndPointerTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -114,7 +112,10 @@ protected:
 
     void TearDown() override
     {
-        const struct { int key; DWORD up; } buttons[] = {
+        const struct {
+            int key;
+            DWORD up;
+        } buttons[] = {
             {VK_LBUTTON, MOUSEEVENTF_LEFTUP}, {VK_RBUTTON, MOUSEEVENTF_RIGHTUP}, {VK_MBUTTON, MOUSEEVENTF_MIDDLEUP}};
         for (const auto& b : buttons)
             if (::GetAsyncKeyState(b.key) & 0x8000)
@@ -185,8 +186,7 @@ protected:
     DWORD base = 0;
 };
 
-class DrawWndPointerBoundTest : public DrawWndPointerTest
-{
+class DrawWndPointerBoundTest : public DrawWndPointerTest {
 protected:
     void SetUp() override
     {
@@ -200,8 +200,7 @@ protected:
 // Zoomed in to two pixels per unit about the middle: the view is 250 x 200
 // units with its top-left corner at (125, 300); ten percent of it is 25
 // units across and 20 up or down.
-class DrawWndPointerZoomedTest : public DrawWndPointerBoundTest
-{
+class DrawWndPointerZoomedTest : public DrawWndPointerBoundTest {
 protected:
     void SetUp() override
     {
@@ -244,15 +243,20 @@ TEST_F(DrawWndPointerTest, WithoutADrawingThePointGivesTheEmptyApertureAndNoAppl
 
 TEST_F(DrawWndPointerBoundTest, ApertureIsTheWorldPointWidenedByTwoPixelsAndOnlyTheClientAreaIsInside)
 {
-    const double tenPixelsPerUnit = 5.0 * std::log2(10.0);   // five levels double the scale
-    const struct { double level; CPoint point; Tavo_GrWRect aperture; bool inside; } rows[] = {
+    const double tenPixelsPerUnit = 5.0 * std::log2(10.0); // five levels double the scale
+    const struct {
+        double level;
+        CPoint point;
+        Tavo_GrWRect aperture;
+        bool inside;
+    } rows[] = {
         {0.0, {100, 150}, {98, 248, 102, 252}, true},
         {0.0, {0, 0}, {-2, 398, 2, 402}, true},
         {0.0, {499, 399}, {497, -1, 501, 3}, true},
-        {0.0, {500, 100}, {498, 298, 502, 302}, false},   // one past the last column
-        {0.0, {100, 400}, {98, -2, 102, 2}, false},       // one past the last row
+        {0.0, {500, 100}, {498, 298, 502, 302}, false}, // one past the last column
+        {0.0, {100, 400}, {98, -2, 102, 2}, false},     // one past the last row
         {0.0, {-1, 10}, {-3, 388, 1, 392}, false},
-        {tenPixelsPerUnit, {250, 200}, {250, 200, 250, 200}, true},   // the point itself
+        {tenPixelsPerUnit, {250, 200}, {250, 200, 250, 200}, true}, // the point itself
         {tenPixelsPerUnit, {260, 190}, {251, 201, 251, 201}, true},
     };
     wnd().dataTipText = "tip";
@@ -330,7 +334,10 @@ TEST_F(DrawWndPointerBoundTest, DragAndDropReachesTheApplicationAfterTheScrollee
 
 TEST_F(DrawWndPointerTest, UnknownActionsAndPansWithoutADrawingStartNothing)
 {
-    const struct { Tavo_WiDrawWnd::DragAction action; UINT button; } rows[] = {
+    const struct {
+        Tavo_WiDrawWnd::DragAction action;
+        UINT button;
+    } rows[] = {
         {static_cast<Tavo_WiDrawWnd::DragAction>(7), MK_LBUTTON},
         {Tavo_WiDrawWnd::Pan, MK_LBUTTON},
         // No release could end that loop: it is not run at all.
@@ -362,7 +369,7 @@ TEST_F(DrawWndPointerZoomedTest, PanDragShowsTheLibrarysPanCursorAndEndsWithTheA
     ::DeleteObject(info.hbmColor);
     EXPECT_EQ(CPoint(info.xHotspot, info.yHotspot), CPoint(16, 16));
 
-    Input(MoveOnly, CPoint(250, 200), 1100);   // with the button down
+    Input(MoveOnly, CPoint(250, 200), 1100); // with the button down
     EXPECT_EQ(Moved(), CSize(25, 0));
     EXPECT_EQ(::GetCursor(), PanCursor());
     Input(MOUSEEVENTF_LEFTUP, CPoint(250, 200), 1200);
@@ -377,13 +384,17 @@ TEST_F(DrawWndPointerZoomedTest, PanDragShowsTheLibrarysPanCursorAndEndsWithTheA
 
 TEST_F(DrawWndPointerZoomedTest, PanDragScrollsByTheMovementInPercentOfTheView)
 {
-    const struct { int direction; CPoint to; CSize moved; } rows[] = {
-        {1, {250, 200}, {25, 0}},    // 50 of 500 pixels left: the view goes right, the drawing with the pointer
+    const struct {
+        int direction;
+        CPoint to;
+        CSize moved;
+    } rows[] = {
+        {1, {250, 200}, {25, 0}}, // 50 of 500 pixels left: the view goes right, the drawing with the pointer
         {-1, {250, 200}, {-25, 0}},
         {1, {350, 200}, {-25, 0}},
-        {1, {300, 160}, {0, -20}},   // 40 of 400 pixels up: the view goes down (world y falls)
+        {1, {300, 160}, {0, -20}}, // 40 of 400 pixels up: the view goes down (world y falls)
         {-1, {300, 160}, {0, 20}},
-        {1, {500, 400}, {-100, 100}},   // the far edges are inside: 40 and 50 percent
+        {1, {500, 400}, {-100, 100}}, // the far edges are inside: 40 and 50 percent
     };
     for (const auto& row : rows) {
         SCOPED_TRACE(testing::Message() << row.direction << " to (" << row.to.x << ", " << row.to.y << ")");
@@ -400,12 +411,15 @@ TEST_F(DrawWndPointerZoomedTest, PanDragScrollsByTheMovementInPercentOfTheView)
 TEST_F(DrawWndPointerZoomedTest, SlowPanMovesBelowHalfAPercentAddUpOnEachAxis)
 {
     // A pixel is 0.2 percent across and 0.25 up or down; one percent is 2 units.
-    const struct { CPoint to; CSize moved; } steps[] = {
-        {{298, 199}, {0, 0}},    // 0.4 and 0.25 percent: the reference stays
-        {{296, 198}, {2, -2}},   // 0.8 and 0.5 from it: one percent each
+    const struct {
+        CPoint to;
+        CSize moved;
+    } steps[] = {
+        {{298, 199}, {0, 0}},  // 0.4 and 0.25 percent: the reference stays
+        {{296, 198}, {2, -2}}, // 0.8 and 0.5 from it: one percent each
         {{295, 198}, {2, -2}},
         {{294, 197}, {2, -2}},
-        {{293, 196}, {4, -4}},   // 0.6 and 0.5 from (296, 198)
+        {{293, 196}, {4, -4}}, // 0.6 and 0.5 from (296, 198)
     };
     StartPan(CPoint(300, 200));
     for (const auto& step : steps) {
@@ -416,15 +430,20 @@ TEST_F(DrawWndPointerZoomedTest, SlowPanMovesBelowHalfAPercentAddUpOnEachAxis)
 
 TEST_F(DrawWndPointerZoomedTest, AutoScrollTickScrollsTowardsTheEdgeWithTheSquareOfTheOvershoot)
 {
-    const struct { int direction; CPoint pointer; CSize moved; bool rearmed; } rows[] = {
-        {1, {-50, 200}, {25, 0}, true},   // a tenth of the width beyond: 10 percent
-        {1, {-5, 200}, {2, 0}, true},     // a hundredth: 1 percent
+    const struct {
+        int direction;
+        CPoint pointer;
+        CSize moved;
+        bool rearmed;
+    } rows[] = {
+        {1, {-50, 200}, {25, 0}, true}, // a tenth of the width beyond: 10 percent
+        {1, {-5, 200}, {2, 0}, true},   // a hundredth: 1 percent
         {1, {550, 200}, {-25, 0}, true},
         {-1, {-50, 200}, {-25, 0}, true},
         {1, {250, -40}, {0, -20}, true},
         {-1, {250, 440}, {0, -20}, true},
         {1, {-50, 440}, {25, 20}, true},
-        {1, {250, 200}, {0, 0}, false},   // back inside: the timer stops
+        {1, {250, 200}, {0, 0}, false}, // back inside: the timer stops
         {1, {500, 400}, {0, 0}, false},
     };
     for (const auto& row : rows) {
@@ -466,7 +485,10 @@ TEST_F(DrawWndPointerZoomedTest, ScrolleeOfNoWidthOrHeightPansAndAutoScrollsNoth
 {
     // The zoom stays while the scrollee has no area, so a pan drag still
     // starts; its steps would divide by the saved size.
-    const struct { CSize size; CPoint start, inside, outside; } rows[] = {
+    const struct {
+        CSize size;
+        CPoint start, inside, outside;
+    } rows[] = {
         {{0, 400}, {5, 200}, {0, 200}, {40, 200}},
         {{500, 0}, {250, 5}, {250, 0}, {250, 40}},
     };
@@ -491,7 +513,10 @@ TEST_F(DrawWndPointerZoomedTest, ScrolleeOfNoWidthOrHeightPansAndAutoScrollsNoth
 
 TEST_F(DrawWndPointerBoundTest, RubberRectangleEndsOnlyWithItsOwnButtonAndIsReportedInWorldCoordinates)
 {
-    const struct { UINT button; DWORD down, up, otherDown, otherUp; } rows[] = {
+    const struct {
+        UINT button;
+        DWORD down, up, otherDown, otherUp;
+    } rows[] = {
         {MK_LBUTTON, MOUSEEVENTF_LEFTDOWN, MOUSEEVENTF_LEFTUP, MOUSEEVENTF_RIGHTDOWN, MOUSEEVENTF_RIGHTUP},
         {MK_RBUTTON, MOUSEEVENTF_RIGHTDOWN, MOUSEEVENTF_RIGHTUP, MOUSEEVENTF_MIDDLEDOWN, MOUSEEVENTF_MIDDLEUP},
         {MK_MBUTTON, MOUSEEVENTF_MIDDLEDOWN, MOUSEEVENTF_MIDDLEUP, MOUSEEVENTF_LEFTDOWN, MOUSEEVENTF_LEFTUP},
@@ -579,4 +604,4 @@ TEST_F(DrawWndPointerBoundTest, QuitTakenByTheRubberRectangleCancelsItAndReaches
     EXPECT_TRUE(OutlineIsClean(CRect(100, 100, 200, 250)));
 }
 
-}  // namespace
+} // namespace

@@ -64,8 +64,7 @@ TEST(PrintMath, WorkedExampleGivesSixColumnsFiveRowsAndCurrentPageEight)
 
 TEST(PrintMath, LayoutsOfTheZeroLevelTheDrawingsCornerAndUnprintableAreas)
 {
-    struct Case
-    {
+    struct Case {
         const char* name;
         Tavo_GrWRect area;
         Tavo_GrWRect bounds;
@@ -76,14 +75,10 @@ TEST(PrintMath, LayoutsOfTheZeroLevelTheDrawingsCornerAndUnprintableAreas)
     const Case cases[] = {
         // At the zero level the area is the drawing: one column, and rows
         // below only when the drawing is taller than a page.
-        {"zero level, low drawing", {0, 0, 1000, 500}, {0, 0, 1000, 500}, ExamplePaper,
-         {1, 1, 1, 1, {0, -843, 1000, 500}}},
-        {"zero level, tall drawing", {0, 0, 1000, 3000}, {0, 0, 1000, 3000}, ExamplePaper,
-         {1, 3, 1, 1, {0, 1656, 1000, 3000}}},
-        {"view at the drawing's top-left corner", {0, 300, 200, 600}, {0, -500, 1000, 600}, ExamplePaper,
-         {5, 5, 1, 1, {0, 331, 200, 600}}},
-        {"drawing within one page", {100, 0, 300, 400}, {150, 200, 250, 300}, ExamplePaper,
-         {1, 1, 1, 1, {100, 131, 300, 400}}},
+        {"zero level, low drawing", {0, 0, 1000, 500}, {0, 0, 1000, 500}, ExamplePaper, {1, 1, 1, 1, {0, -843, 1000, 500}}},
+        {"zero level, tall drawing", {0, 0, 1000, 3000}, {0, 0, 1000, 3000}, ExamplePaper, {1, 3, 1, 1, {0, 1656, 1000, 3000}}},
+        {"view at the drawing's top-left corner", {0, 300, 200, 600}, {0, -500, 1000, 600}, ExamplePaper, {5, 5, 1, 1, {0, 331, 200, 600}}},
+        {"drawing within one page", {100, 0, 300, 400}, {150, 200, 250, 300}, ExamplePaper, {1, 1, 1, 1, {100, 131, 300, 400}}},
         // A header as tall as the paper leaves pages of no height.
         {"page of no height", {0, 0, 1000, 500}, roomy, {100, 150, 100}, {1, 1, 1, 1, {0, 0, 1000, 500}}},
         {"paper of no width", {0, 0, 1000, 500}, roomy, {0, 0, 0}, {1, 1, 1, 1, {0, 0, 1000, 500}}},
@@ -152,15 +147,14 @@ std::string DescribeRangeGroup(HWND dialog)
     const bool aligned = right(Ids::AllPagesButtonId) == edge && right(Ids::CurrentPageButtonId) == edge;
     const bool current = ::IsDlgButtonChecked(dialog, Ids::CurrentPageButtonId) == BST_CHECKED;
     return text(Ids::FirstPageBoxId) + " to " + text(Ids::LastPageBoxId) + " | " + text(Ids::AllPagesButtonId) +
-           " | " + text(Ids::CurrentPageButtonId) + (aligned ? " | aligned" : " | not aligned") +
-           (current ? " | current chosen" : " | current not chosen");
+        " | " + text(Ids::CurrentPageButtonId) + (aligned ? " | aligned" : " | not aligned") +
+        (current ? " | current chosen" : " | current not chosen");
 }
 
 // Shows the real print dialog through the application; once it has been
 // initialised (OnInitDialog included), visit sees it, then it is closed with
 // command as if the user pressed that button.
-class DialogRun
-{
+class DialogRun {
 public:
     static int Show(CWinApp& app, CPrintDialog* dialog, UINT command, const std::function<void(HWND)>& visit)
     {
@@ -215,8 +209,7 @@ TEST(PrintDialog, RelabelsThePageRangeGroupForTheGridAndChoosesTheCurrentPage)
 // ---- a window laid out for the default printer -------------------------------
 
 // The page of a device context as OnPrint sees it.
-struct PageGeometry
-{
+struct PageGeometry {
     explicit PageGeometry(CDC& dc)
     {
         TEXTMETRICA metrics = {};
@@ -237,8 +230,7 @@ struct PageGeometry
 // gets a marker of its own colour in the upper left quarter of its box:
 // a page that shows another page's box, or its own box turned, is caught.
 // The markers stay within the grid, so the layout does not change.
-class PrintedGrid : public ::testing::Test
-{
+class PrintedGrid : public ::testing::Test {
 protected:
     PrintedGrid()
     {
@@ -273,8 +265,7 @@ protected:
         const Tavo_GrWRect box = PageBox(layout, page);
         const int w = box.x2 - box.x1;
         const int h = box.y2 - box.y1;
-        return {{box.x1 + w / 4, box.y2 - h / 4}, {box.x2 - w / 4, box.y2 - h / 4}, {box.x1 + w / 4, box.y1 + h / 4},
-                {box.x2 - w / 4, box.y1 + h / 4}};
+        return {{box.x1 + w / 4, box.y2 - h / 4}, {box.x2 - w / 4, box.y2 - h / 4}, {box.x1 + w / 4, box.y1 + h / 4}, {box.x2 - w / 4, box.y1 + h / 4}};
     }
     // What the centre of quarter q of a page shows in colour: its marker or paper.
     static COLORREF QuarterColour(int page, size_t q)
@@ -338,7 +329,7 @@ TEST_F(PrintedGrid, AtTheZeroLevelTheDrawingIsPrintedInOneColumnFromPageOne)
     hosted.wnd.OnPreparePrinting(&info);
     const Tavo_WiPrintLayout& zero = hosted.wnd.GetPrintLayout();
     EXPECT_EQ(zero.m_numCols, 1);
-    EXPECT_EQ(zero.m_numRows, 1);   // the drawing is square, the page taller
+    EXPECT_EQ(zero.m_numRows, 1); // the drawing is square, the page taller
     EXPECT_EQ(zero.m_currentPage, 1);
     EXPECT_EQ(zero.m_firstPageBox.x1, drawing.GetBounds().x1);
     EXPECT_EQ(zero.m_firstPageBox.x2, drawing.GetBounds().x2);
@@ -369,8 +360,7 @@ TEST(PrintLayout, WithoutPrinterDefaultsOrDrawingTheLayoutIsOnePage)
 // makes of it.
 TEST_F(PrintedGrid, BeginPrintingTurnsTheCurrentPageChoiceIntoARangeAndLeavesTheOthers)
 {
-    struct Case
-    {
+    struct Case {
         const char* name;
         std::function<void(HWND)> choose;
         bool currentPage;
@@ -411,8 +401,7 @@ TEST_F(PrintedGrid, BeginPrintingTurnsTheCurrentPageChoiceIntoARangeAndLeavesThe
 
 // A page printed into a 32-bit bitmap. A memory device context reports the
 // screen's size as its page, so the bitmap is that size.
-struct BitmapPage
-{
+struct BitmapPage {
     BitmapPage() : canvas(::GetSystemMetrics(SM_CXSCREEN), ::GetSystemMetrics(SM_CYSCREEN))
     {
         dc.Attach(canvas.GetDC());
@@ -436,8 +425,7 @@ CRect Ink(const std::function<COLORREF(int, int)>& pixel, int width, int top, in
 }
 
 // The corners of a page's body, each with the directions its mark's arms run in.
-struct Corner
-{
+struct Corner {
     int x, y, dx, dy;
 };
 std::vector<Corner> Corners(const PageGeometry& page)
@@ -509,8 +497,7 @@ TEST_F(PrintedGrid, PagesOutsideTheGridPrintNothing)
 }
 
 // A print surface that notes its settings while it draws.
-class ObservingSurface : public Tavo_WiWin32Surface
-{
+class ObservingSurface : public Tavo_WiWin32Surface {
 public:
     void DrawRect(Tavo_GrDRect& rect, Tavo_GrAttr* attr) override
     {
@@ -524,8 +511,7 @@ public:
 
 // Makes the framework's device contexts report a number of colours for one
 // device context.
-class ColourCount
-{
+class ColourCount {
 public:
     ColourCount(HDC dc, int colours)
         : m_patch(::GetModuleHandleA("afx.dll"), "GetDeviceCaps", reinterpret_cast<void*>(&Answer))
@@ -550,10 +536,9 @@ private:
 
 TEST_F(PrintedGrid, TwoColourDevicesPrintGreyThroughThePaletteOthersInColourAndTheSurfaceIsRestored)
 {
-    struct Case
-    {
-        int colours;            // what the device reports as NUMCOLORS
-        bool blackAndWhite;     // the surface's own setting
+    struct Case {
+        int colours;        // what the device reports as NUMCOLORS
+        bool blackAndWhite; // the surface's own setting
         bool grey;
     };
     // True-colour devices, printers among them, report -1.
@@ -640,7 +625,7 @@ TEST_F(PrintJob, PrintsEveryPageOfTheGridToPostScriptAndRestoresTheSurfaceAfterE
 bool Near(COLORREF a, COLORREF b, int tolerance)
 {
     return std::abs(GetRValue(a) - GetRValue(b)) <= tolerance && std::abs(GetGValue(a) - GetGValue(b)) <= tolerance &&
-           std::abs(GetBValue(a) - GetBValue(b)) <= tolerance;
+        std::abs(GetBValue(a) - GetBValue(b)) <= tolerance;
 }
 
 bool DarkAround(const Picture& picture, CPoint at, int radius)
@@ -700,4 +685,4 @@ TEST_F(PrintedPages, ShowTheirHeaderCornerMarksAndOwnBoxInColour)
     }
 }
 
-}  // namespace
+} // namespace

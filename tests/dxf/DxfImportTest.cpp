@@ -49,8 +49,7 @@ TEST(DxfImport, LayersBecomeCoreLayersAndHiddenOnesAreInvisible)
         const char* name;
         bool visible;
         int items;
-    } expected[] = {{"Walls", true, 4}, {"Hidden", false, 1}, {"Frozen", false, 1}, {"Orange", true, 1},
-                    {"TrueColour", true, 1}, {"0", true, 0}, {"Extra", true, 1}};
+    } expected[] = {{"Walls", true, 4}, {"Hidden", false, 1}, {"Frozen", false, 1}, {"Orange", true, 1}, {"TrueColour", true, 1}, {"0", true, 0}, {"Extra", true, 1}};
     for (int i = 0; i < 7; ++i) {
         EXPECT_STREQ(drawing.GetLayer(i)->GetName(), expected[i].name);
         EXPECT_EQ(drawing.GetLayer(i)->IsVisible(), expected[i].visible) << expected[i].name;
@@ -85,9 +84,9 @@ TEST(DxfImport, AFullPaletteGivesTheNearestColour)
     for (int i = palette.GetColorCount(); i < Tavo_WiPalette::kMaxEntries; ++i)
         palette.AddColor("filler", 0, 0, static_cast<unsigned char>(i));
     Tavo_DxfPaletteColours colours(palette);
-    EXPECT_EQ(colours.ColourIndexOf({250, 2, 3}), 4);        // near enough to red
-    EXPECT_EQ(colours.ColourIndexOf({255, 127, 0}), 4);      // orange: no room, red is nearest
-    EXPECT_EQ(colours.ColourIndexOf({0, 0, 100}), 100);      // a filler holds exactly that
+    EXPECT_EQ(colours.ColourIndexOf({250, 2, 3}), 4);   // near enough to red
+    EXPECT_EQ(colours.ColourIndexOf({255, 127, 0}), 4); // orange: no room, red is nearest
+    EXPECT_EQ(colours.ColourIndexOf({0, 0, 100}), 100); // a filler holds exactly that
     const int full = Tavo_WiPalette::kMaxEntries;
     EXPECT_EQ(palette.GetColorCount(), full);
 }
@@ -124,9 +123,9 @@ TEST(DxfImport, ImportedDrawingPaintsItsColoursThroughTheSurface)
     Tavo_WiWin32Surface surface;
     surface.SetDC(canvas.GetDC());
     imported->drawing.Draw(surface, mapping, nullptr);
-    EXPECT_GT(canvas.CountPixels(RGB(255, 0, 0)), 300);        // Walls
-    EXPECT_GT(canvas.CountPixels(RGB(255, 127, 0)), 300);      // Orange
-    EXPECT_EQ(canvas.CountPixels(RGB(0, 255, 0)), 0);          // Frozen is not drawn
+    EXPECT_GT(canvas.CountPixels(RGB(255, 0, 0)), 300);   // Walls
+    EXPECT_GT(canvas.CountPixels(RGB(255, 127, 0)), 300); // Orange
+    EXPECT_EQ(canvas.CountPixels(RGB(0, 255, 0)), 0);     // Frozen is not drawn
 }
 
 // ---- Bad input ----------------------------------------------------------------------------

@@ -27,7 +27,7 @@ std::vector<Tavo_DxfPair> AllPairs(Tavo_DxfReader& reader)
 TEST(DxfReader, ReadsPairsWithTheirLineWhateverTheLineEnds)
 {
     for (const std::string& text : {std::string("  0\nLINE\n 10\n1.5\n"), std::string("  0\r\nLINE\r\n 10\r\n1.5\r\n"),
-                                   std::string("  0\rLINE\r 10\r1.5"), std::string("\xEF\xBB\xBF  0\nLINE  \n 10\n1.5")}) {
+                                    std::string("  0\rLINE\r 10\r1.5"), std::string("\xEF\xBB\xBF  0\nLINE  \n 10\n1.5")}) {
         Tavo_DxfReader reader(text.data(), text.size());
         const std::vector<Tavo_DxfPair> pairs = AllPairs(reader);
         ASSERT_EQ(pairs.size(), 2u) << text;
@@ -86,10 +86,30 @@ TEST(DxfColours, AciTableHasTheStandardColours)
         int aci;
         uint32_t rgb;
     } cases[] = {
-        {1, 0xFF0000},   {2, 0xFFFF00},  {3, 0x00FF00},  {4, 0x00FFFF},  {5, 0x0000FF},   {6, 0xFF00FF},
-        {7, 0xFFFFFF},   {8, 0x808080},  {9, 0xC0C0C0},  {10, 0xFF0000}, {11, 0xFF7F7F},  {13, 0xCC6666},
-        {20, 0xFF3F00},  {21, 0xFF9F7F}, {30, 0xFF7F00}, {40, 0xFFBF00}, {140, 0x00BFFF}, {190, 0x7F00FF},
-        {249, 0x4C262F}, {250, 0x333333}, {255, 0xFFFFFF}, {-1, 0xFF0000}, {0, 0x000000}, {256, 0x000000},
+        {1, 0xFF0000},
+        {2, 0xFFFF00},
+        {3, 0x00FF00},
+        {4, 0x00FFFF},
+        {5, 0x0000FF},
+        {6, 0xFF00FF},
+        {7, 0xFFFFFF},
+        {8, 0x808080},
+        {9, 0xC0C0C0},
+        {10, 0xFF0000},
+        {11, 0xFF7F7F},
+        {13, 0xCC6666},
+        {20, 0xFF3F00},
+        {21, 0xFF9F7F},
+        {30, 0xFF7F00},
+        {40, 0xFFBF00},
+        {140, 0x00BFFF},
+        {190, 0x7F00FF},
+        {249, 0x4C262F},
+        {250, 0x333333},
+        {255, 0xFFFFFF},
+        {-1, 0xFF0000},
+        {0, 0x000000},
+        {256, 0x000000},
     };
     for (const auto& c : cases)
         EXPECT_EQ(Tavo_DxfAciColour(c.aci).Packed(), c.rgb) << "ACI " << c.aci;
@@ -110,7 +130,9 @@ TEST(DxfColours, NearestColourWeighsGreenMost)
 
 TEST(DxfText, TextControlCodesAndEncodings)
 {
-    EXPECT_EQ(Tavo_DxfPlainText("%%c20 %%p0.1 45%%d 100%%%", false), "\xD8" "20 \xB1" "0.1 45\xB0 100%");
+    EXPECT_EQ(Tavo_DxfPlainText("%%c20 %%p0.1 45%%d 100%%%", false), "\xD8"
+                                                                     "20 \xB1"
+                                                                     "0.1 45\xB0 100%");
     EXPECT_EQ(Tavo_DxfPlainText("%%uunder%%u \\U+00E9t\\U+20AC", false), "under \xE9t\x80");
     EXPECT_EQ(Tavo_DxfPlainText("Caf\xC3\xA9 \xE2\x86\x92", true), "Caf\xE9 ?");
     EXPECT_EQ(Tavo_DxfPlainText("Caf\xE9", false), "Caf\xE9");
@@ -124,7 +146,8 @@ TEST(DxfText, MTextFormattingIsRemovedAndParagraphsSplit)
         Tavo_DxfPlainMText("{\\fArial|b1|i0;Bold} \\H2.5x;big\\Pa\\~b \\S1^2; \\{x\\}\\\\\\P\\C1;red\\LU\\l", false);
     ASSERT_EQ(lines.size(), 3u);
     EXPECT_EQ(lines[0], "Bold big");
-    EXPECT_EQ(lines[1], "a\xA0" "b 1/2 {x}\\");
+    EXPECT_EQ(lines[1], "a\xA0"
+                        "b 1/2 {x}\\");
     EXPECT_EQ(lines[2], "redU");
     EXPECT_EQ(Tavo_DxfPlainMText("unterminated \\fArial", false), std::vector<std::string>{"unterminated "});
 }

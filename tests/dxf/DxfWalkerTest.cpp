@@ -105,7 +105,8 @@ TEST_F(EntitiesFile, TextsArePlainWithHeightAndAlignment)
 {
     ASSERT_EQ(Shapes().size(), 13u);
     const RecordingSink::Shape& text = Shapes()[7];
-    EXPECT_EQ(text.string, "Caf\xE9 \xD8" "10 \xB0");
+    EXPECT_EQ(text.string, "Caf\xE9 \xD8"
+                           "10 \xB0");
     ExpectPoint(text.text.anchor, 10, 60); // centred: placed at the alignment point
     EXPECT_EQ(text.text.height, 5.0);
     EXPECT_EQ(text.text.align, Tavo_GrAttr::AlignCentre | Tavo_GrAttr::AlignBottom);
@@ -219,8 +220,14 @@ TEST(LayersFile, LayerTableColoursAndOverrides)
         const char* layer;
         uint32_t rgb;
     } expected[] = {
-        {"WALLS", 0xFF0000},      {"WALLS", 0x0000FF},      {"HIDDEN", 0x0000FF}, {"FROZEN", 0x00FF00},
-        {"ORANGE", 0xFF7F00},     {"TRUECOLOUR", 0x123456}, {"WALLS", 0x000000},  {"WALLS", 0xC86400},
+        {"WALLS", 0xFF0000},
+        {"WALLS", 0x0000FF},
+        {"HIDDEN", 0x0000FF},
+        {"FROZEN", 0x00FF00},
+        {"ORANGE", 0xFF7F00},
+        {"TRUECOLOUR", 0x123456},
+        {"WALLS", 0x000000},
+        {"WALLS", 0xC86400},
         {"EXTRA", 0x00FFFF},
     };
     ASSERT_EQ(dxf.sink.shapes.size(), 9u);

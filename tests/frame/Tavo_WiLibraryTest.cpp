@@ -68,7 +68,8 @@ TEST(LibraryEntry, ASecondProcessAttachAndOtherNotificationsChangeNothing)
     // The second attach comes with another instance handle: work done again
     // would show in the record or in the registered resource modules.
     for (auto [instance, reason] : {std::pair<HINSTANCE, DWORD>{GetModuleHandleA(nullptr), DLL_PROCESS_ATTACH},
-                                    {LibraryModule(), DLL_THREAD_ATTACH}, {LibraryModule(), DLL_THREAD_DETACH},
+                                    {LibraryModule(), DLL_THREAD_ATTACH},
+                                    {LibraryModule(), DLL_THREAD_DETACH},
                                     {LibraryModule(), DLL_PROCESS_DETACH}}) {
         SCOPED_TRACE(reason);
         const auto before = AttachState();

@@ -1,5 +1,6 @@
-// controls_test.cpp - CScrollBar and CButton on real controls, and the
-// scroll messages a bar sends to its parent's message map.
+// controls_test.cpp - CScrollBar, CButton and CStatusBarCtrl on real
+// controls, and the scroll messages a bar sends to its parent's message map.
+#include <afxcmn.h>
 #include <afxwin.h>
 
 #include <vector>
@@ -12,6 +13,7 @@ namespace {
 
 constexpr UINT kBarId = 1001;
 constexpr UINT kButtonId = 1003;
+constexpr UINT kStatusBarId = 1004;
 
 struct ScrollEvent {
     UINT message;
@@ -20,8 +22,7 @@ struct ScrollEvent {
     CScrollBar* bar;
 };
 
-class CScrollParentWnd : public CWnd
-{
+class CScrollParentWnd : public CWnd {
 public:
     std::vector<ScrollEvent> m_events;
 
@@ -42,8 +43,7 @@ BEGIN_MESSAGE_MAP(CScrollParentWnd, CWnd)
     ON_WM_VSCROLL()
 END_MESSAGE_MAP()
 
-class ControlsTest : public framework_test::WindowTest
-{
+class ControlsTest : public framework_test::WindowTest {
 protected:
     void SetUp() override
     {
@@ -52,7 +52,7 @@ protected:
     CScrollParentWnd m_parent;
 };
 
-}  // namespace
+} // namespace
 
 TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
 {
@@ -68,7 +68,7 @@ TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
     page.fMask = SIF_PAGE;
     page.nPage = 100;
     EXPECT_TRUE(vertical.SetScrollInfo(&page));
-    EXPECT_EQ(32767 - 99, vertical.GetScrollLimit());  // the last position that still shows a full page
+    EXPECT_EQ(32767 - 99, vertical.GetScrollLimit()); // the last position that still shows a full page
     vertical.SetScrollPos(500);
     EXPECT_EQ(500, vertical.GetScrollPos());
     m_parent.SendMessage(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 4242), reinterpret_cast<LPARAM>(vertical.m_hWnd));
@@ -82,7 +82,7 @@ TEST_F(ControlsTest, ScrollBarIsARealControlReportingToItsParentsMap)
     ASSERT_TRUE(horizontal.Create(WS_CHILD | WS_VISIBLE | SBS_HORZ, CRect(20, 0, 120, 16), &m_parent, kBarId + 1));
     horizontal.SetScrollRange(0, 100);
     m_parent.m_events.clear();
-    horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0);  // the control itself reports to its parent
+    horizontal.SendMessage(WM_KEYDOWN, VK_RIGHT, 0); // the control itself reports to its parent
     ASSERT_FALSE(m_parent.m_events.empty());
     EXPECT_EQ(static_cast<UINT>(WM_HSCROLL), m_parent.m_events.front().message);
     EXPECT_EQ(static_cast<UINT>(SB_LINERIGHT), m_parent.m_events.front().code);
@@ -104,4 +104,40 @@ TEST_F(ControlsTest, ButtonIsARealControlWithItsCaptionAndCheck)
     button.SetCheck(BST_CHECKED);
     EXPECT_EQ(BST_CHECKED, button.GetCheck());
     EXPECT_EQ(&button, m_parent.GetDlgItem(kButtonId));
+}
+
+TEST_F(ControlsTest, StatusBarPlacesItselfAtTheBottomAndKeepsATextPerPart)
+{
+    CStatusBarCtrl bar;
+    ASSERT_TRUE(bar.Create(WS_VISIBLE, CRect(5, 5, 6, 6), &m_parent, kStatusBarId));
+    EXPECT_EQ(&bar, CWnd::FromHandlePermanent(bar.m_hWnd));
+    EXPECT_TRUE(bar.GetStyle() & WS_CHILD);
+    bar.SendMessage(WM_SIZE, 0, 0);
+    CRect client;
+    CRect placed;
+    m_parent.GetClientRect(&client);
+    bar.GetWindowRect(&placed);
+    m_parent.ScreenToClient(&placed);
+    EXPECT_EQ(placed.bottom, client.bottom) << "the rectangle given to Create is ignored";
+    EXPECT_EQ(placed.Width(), client.Width());
+
+    int edges[3] = {60, 120, -1};
+    ASSERT_TRUE(bar.SetParts(3, edges));
+    int read[3] = {};
+    EXPECT_EQ(3, bar.GetParts(3, read));
+    EXPECT_EQ(120, read[1]);
+    EXPECT_EQ(3, bar.GetParts(0, NULL));
+    ASSERT_TRUE(bar.SetText("zoom 2", 1, SBT_POPOUT));
+    ASSERT_TRUE(bar.SetText("", 2, 0));
+    int type = -1;
+    EXPECT_STREQ("zoom 2", static_cast<LPCSTR>(bar.GetText(1, &type)));
+    EXPECT_EQ(SBT_POPOUT, type);
+    EXPECT_EQ(6, bar.GetTextLength(1));
+    EXPECT_STREQ("", static_cast<LPCSTR>(bar.GetText(2)));
+    CRect part;
+    ASSERT_TRUE(bar.GetRect(1, &part));
+    EXPECT_LE(part.right, 120);
+    EXPECT_GE(part.left, 60);
+    bar.SetSimple(TRUE);
+    EXPECT_TRUE(bar.IsSimple());
 }

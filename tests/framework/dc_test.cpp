@@ -19,15 +19,14 @@ struct PixelSurface {
     }
     ~PixelSurface()
     {
-        ::DeleteDC(dc);  // lets go of the bitmap, which can then be deleted
+        ::DeleteDC(dc); // lets go of the bitmap, which can then be deleted
         ::DeleteObject(bitmap);
     }
     HDC dc = ::CreateCompatibleDC(NULL);
     HBITMAP bitmap = ::CreateBitmap(kBitmapSize, kBitmapSize, 1, 32, NULL);
 };
 
-class CPaintRecorderWnd : public CWnd
-{
+class CPaintRecorderWnd : public CWnd {
 public:
     HDC m_paintDc = NULL;
     bool m_paintDcWasMapped = false;
@@ -48,7 +47,7 @@ END_MESSAGE_MAP()
 
 using DcTest = framework_test::WindowTest;
 
-}  // namespace
+} // namespace
 
 TEST_F(DcTest, PaintDcEndsPaintingAndLetsGoOfItsDc)
 {
@@ -60,10 +59,10 @@ TEST_F(DcTest, PaintDcEndsPaintingAndLetsGoOfItsDc)
     EXPECT_TRUE(wnd.m_paintDcWasMapped);
     RECT update;
     EXPECT_FALSE(::GetUpdateRect(wnd.m_hWnd, &update, FALSE));
-    EXPECT_EQ(0, ::ReleaseDC(wnd.m_hWnd, wnd.m_paintDc));  // EndPaint already gave it back
+    EXPECT_EQ(0, ::ReleaseDC(wnd.m_hWnd, wnd.m_paintDc)); // EndPaint already gave it back
     CDC* afterwards = CDC::FromHandle(wnd.m_paintDc);
     ASSERT_NE(nullptr, afterwards);
-    EXPECT_EQ(wnd.m_paintDc, afterwards->m_hDC);  // a fresh temporary, not the destroyed CPaintDC
+    EXPECT_EQ(wnd.m_paintDc, afterwards->m_hDC); // a fresh temporary, not the destroyed CPaintDC
 }
 
 TEST_F(DcTest, ClientDcReleasesItsDc)
@@ -77,7 +76,7 @@ TEST_F(DcTest, ClientDcReleasesItsDc)
         ASSERT_NE(nullptr, hDC);
         EXPECT_EQ(&dc, CDC::FromHandle(hDC));
     }
-    EXPECT_EQ(0, ::ReleaseDC(wnd.m_hWnd, hDC));  // already released
+    EXPECT_EQ(0, ::ReleaseDC(wnd.m_hWnd, hDC)); // already released
 }
 
 TEST_F(DcTest, DcDeletesTheHandleItCreatedUnlessDetached)
@@ -94,7 +93,7 @@ TEST_F(DcTest, DcDeletesTheHandleItCreatedUnlessDetached)
         kept = detached.Detach();
         EXPECT_EQ(nullptr, detached.m_hDC);
         EXPECT_EQ(nullptr, detached.m_hAttribDC);
-        EXPECT_NE(&detached, CDC::FromHandle(kept));  // no longer mapped to it
+        EXPECT_NE(&detached, CDC::FromHandle(kept)); // no longer mapped to it
     }
     EXPECT_EQ(0u, ::GetObjectType(deleted));
     EXPECT_NE(0u, ::GetObjectType(kept));
@@ -105,7 +104,7 @@ TEST_F(DcTest, DrawingGoesToOutputHandleAndMetricsComeFromAttributeHandle)
 {
     LOGFONTA tall = {};
     tall.lfHeight = 40;
-    CFont tallFont;  // declared first: the surfaces' DCs go before the font they hold
+    CFont tallFont; // declared first: the surfaces' DCs go before the font they hold
     ASSERT_TRUE(tallFont.CreateFontIndirect(&tall));
     PixelSurface output;
     PixelSurface attribute;
@@ -121,12 +120,12 @@ TEST_F(DcTest, DrawingGoesToOutputHandleAndMetricsComeFromAttributeHandle)
     EXPECT_EQ(40, metrics.tmHeight);
     EXPECT_NE(40, outputMetrics.tmHeight);
     EXPECT_GT(dc.GetTextExtent("Wide text").cy, dc.GetOutputTextExtent("Wide text", 9).cy);
-    dc.SetTextColor(RGB(1, 2, 3));  // attributes are set on both handles
+    dc.SetTextColor(RGB(1, 2, 3)); // attributes are set on both handles
     EXPECT_EQ(RGB(1, 2, 3), ::GetTextColor(output.dc));
     EXPECT_EQ(RGB(1, 2, 3), ::GetTextColor(attribute.dc));
 
     CPen red(PS_SOLID, 1, kRed);
-    CPen* previous = dc.SelectObject(&red);  // the old pen comes back wrapped
+    CPen* previous = dc.SelectObject(&red); // the old pen comes back wrapped
     ASSERT_NE(nullptr, previous);
     EXPECT_EQ(::GetStockObject(BLACK_PEN), previous->m_hObject);
     dc.FillSolidRect(2, 2, 4, 4, kRed);
@@ -137,7 +136,7 @@ TEST_F(DcTest, DrawingGoesToOutputHandleAndMetricsComeFromAttributeHandle)
         EXPECT_EQ(kRed, ::GetPixel(output.dc, drawn.x, drawn.y));
         EXPECT_EQ(RGB(255, 255, 255), ::GetPixel(attribute.dc, drawn.x, drawn.y));
     }
-    EXPECT_EQ(CPoint(20, 10), dc.GetCurrentPosition());  // kept on the attribute handle too
+    EXPECT_EQ(CPoint(20, 10), dc.GetCurrentPosition()); // kept on the attribute handle too
     dc.ReleaseAttribDC();
     dc.ReleaseOutputDC();
 }

@@ -14,7 +14,7 @@ HMODULE ExtensionModule() { return ::GetModuleHandleA("afx_test_extension.dll");
 
 using ExtensionTest = framework_test::WindowTest;
 
-}  // namespace
+} // namespace
 
 TEST_F(ExtensionTest, StringIsFoundInTheLibraryThatJoinedTheChainAtLoad)
 {
@@ -42,7 +42,7 @@ TEST_F(ExtensionTest, RemovedLinkIsNoLongerSearched)
 {
     AFX_EXTENSION_MODULE record = {};
     ASSERT_TRUE(AfxInitExtensionModule(record, ExtensionModule()));
-    EXPECT_TRUE(AfxInitExtensionModule(record, NULL));  // already initialised: unchanged
+    EXPECT_TRUE(AfxInitExtensionModule(record, NULL)); // already initialised: unchanged
     EXPECT_EQ(ExtensionModule(), record.hResource);
     // A system link for the same module is searched only after application
     // links; removing the records of this module leaves nothing to find.

@@ -20,8 +20,7 @@ inline void DispatchPendingMessages()
 }
 
 // Leaves no message and no temporary object behind for the next test.
-class WindowTest : public ::testing::Test
-{
+class WindowTest : public ::testing::Test {
 protected:
     void TearDown() override
     {
@@ -30,6 +29,6 @@ protected:
     }
 };
 
-}  // namespace framework_test
+} // namespace framework_test
 
 #endif

@@ -36,11 +36,11 @@ TEST(GdiObjectOwnership, DestructorDeletesCreatedObjectsButNotDetachedOnes)
 TEST(GdiObjectOwnership, WrapperHoldsOneObjectAndDeletesItOnce)
 {
     CBrush brush;
-    EXPECT_FALSE(brush.DeleteObject());  // nothing to delete
+    EXPECT_FALSE(brush.DeleteObject()); // nothing to delete
     ASSERT_TRUE(brush.CreateSolidBrush(RGB(4, 4, 4)));
     const HGDIOBJ deleted = brush.m_hObject;
     const HBRUSH another = ::CreateSolidBrush(RGB(6, 6, 6));
-    EXPECT_FALSE(brush.Attach(another));  // the first one would leak
+    EXPECT_FALSE(brush.Attach(another)); // the first one would leak
     EXPECT_EQ(deleted, brush.m_hObject);
     ::DeleteObject(another);
     EXPECT_TRUE(brush.DeleteObject());

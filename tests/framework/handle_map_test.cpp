@@ -9,8 +9,7 @@ namespace {
 // Deletes the calling thread's temporary objects, as idle time does.
 void RunIdleCleanUp() { CWinThread().OnIdle(1); }
 
-class HandleMapTest : public ::testing::Test
-{
+class HandleMapTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -28,10 +27,10 @@ protected:
     }
     HWND m_rawWindow = NULL;
     HDC m_screen = NULL;
-    HDC m_other = NULL;  // marks a temporary CDC: only that object carries it as its attribute handle
+    HDC m_other = NULL; // marks a temporary CDC: only that object carries it as its attribute handle
 };
 
-}  // namespace
+} // namespace
 
 TEST_F(HandleMapTest, PermanentObjectsRoundTripUntilDetached)
 {
@@ -53,7 +52,7 @@ TEST_F(HandleMapTest, PermanentObjectsRoundTripUntilDetached)
 
 TEST_F(HandleMapTest, TemporaryObjectsLastUntilIdleAndNeverDestroyTheirHandles)
 {
-    EXPECT_EQ(nullptr, CWnd::FromHandle(NULL));  // no handle, no object
+    EXPECT_EQ(nullptr, CWnd::FromHandle(NULL)); // no handle, no object
     EXPECT_EQ(nullptr, CWnd::FromHandlePermanent(NULL));
     EXPECT_EQ(nullptr, CDC::FromHandle(NULL));
     EXPECT_EQ(nullptr, CGdiObject::FromHandle(NULL));
@@ -69,12 +68,12 @@ TEST_F(HandleMapTest, TemporaryObjectsLastUntilIdleAndNeverDestroyTheirHandles)
     EXPECT_EQ(m_other, CDC::FromHandle(m_screen)->m_hAttribDC);
     const HPEN pen = ::CreatePen(PS_SOLID, 1, RGB(1, 2, 3));
     const HBRUSH brush = ::CreateSolidBrush(RGB(4, 5, 6));
-    EXPECT_NE(nullptr, dynamic_cast<CPen*>(CGdiObject::FromHandle(pen)));  // the handle's own class
+    EXPECT_NE(nullptr, dynamic_cast<CPen*>(CGdiObject::FromHandle(pen))); // the handle's own class
     EXPECT_NE(nullptr, dynamic_cast<CBrush*>(CGdiObject::FromHandle(brush)));
     EXPECT_EQ(pen, CPen::FromHandle(pen)->m_hObject);
 
     RunIdleCleanUp();
-    EXPECT_EQ(m_screen, CDC::FromHandle(m_screen)->m_hAttribDC);  // a new object
+    EXPECT_EQ(m_screen, CDC::FromHandle(m_screen)->m_hAttribDC); // a new object
     RunIdleCleanUp();
     EXPECT_TRUE(::IsWindow(m_rawWindow));
     EXPECT_EQ(m_rawWindow, CWnd::FromHandle(m_rawWindow)->m_hWnd);

@@ -21,15 +21,14 @@ constexpr LRESULT kDerivedAnswer = 33;
 // Registered before any map is walked: the maps read it at dispatch time.
 UINT g_registeredMessage = ::RegisterWindowMessageA("TavoAfxTestRegistered");
 
-class CBaseTestWnd : public CWnd
-{
+class CBaseTestWnd : public CWnd {
 public:
     std::vector<UINT> m_messagesSeen;
     int m_createCount = 0;
     LPVOID m_createParam = NULL;
     int m_baseSizeCount = 0;
-    CSize m_lastSize {-1, -1};
-    CPoint m_lastPoint {-1, -1};
+    CSize m_lastSize{-1, -1};
+    CPoint m_lastPoint{-1, -1};
     WPARAM m_lastRegisteredWParam = 0;
     int m_postNcDestroyCount = 0;
     bool m_throwOnAppMessage = false;
@@ -88,8 +87,7 @@ END_MESSAGE_MAP()
 
 // Overrides a base handler, adds an entry of its own, and takes WM_NCDESTROY
 // itself, leaving out the framework's handling.
-class CDerivedTestWnd : public CBaseTestWnd
-{
+class CDerivedTestWnd : public CBaseTestWnd {
 public:
     int m_derivedSizeCount = 0;
     int m_ncDestroyCount = 0;
@@ -114,7 +112,7 @@ END_MESSAGE_MAP()
 
 using MessageMapTest = framework_test::WindowTest;
 
-}  // namespace
+} // namespace
 
 TEST_F(MessageMapTest, CreateHooksObjectsBeforeFirstMessageEvenWhenNested)
 {
@@ -138,7 +136,7 @@ TEST_F(MessageMapTest, CreateHooksObjectsBeforeFirstMessageEvenWhenNested)
     EXPECT_EQ(&wnd, CWnd::FromHandlePermanent(wnd.m_hWnd));
     EXPECT_EQ(reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc()), ::GetWindowLongPtrA(wnd.m_hWnd, GWLP_WNDPROC));
     EXPECT_EQ(1, wnd.m_inner.m_createCount);
-    EXPECT_EQ(&wnd.m_inner, wnd.GetDlgItem(9));  // a child of the outer window, mapped to its object
+    EXPECT_EQ(&wnd.m_inner, wnd.GetDlgItem(9)); // a child of the outer window, mapped to its object
 }
 
 TEST_F(MessageMapTest, FailedCreateLeavesObjectUnattached)
@@ -167,10 +165,10 @@ TEST_F(MessageMapTest, BaseClassEntriesDispatchAndContainExceptions)
     EXPECT_EQ(kAppAnswer, wnd.SendMessage(kAppMessage));
     EXPECT_EQ(kRegisteredAnswer, wnd.SendMessage(g_registeredMessage, 77));
     EXPECT_EQ(77u, wnd.m_lastRegisteredWParam);
-    EXPECT_EQ(0, wnd.SendMessage(kDerivedOnlyMessage));  // a derived class's entry is not the base's
+    EXPECT_EQ(0, wnd.SendMessage(kDerivedOnlyMessage)); // a derived class's entry is not the base's
     wnd.SendMessage(WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(static_cast<WORD>(-3), 5));
     EXPECT_EQ(CPoint(-3, 5), wnd.m_lastPoint);
-    wnd.m_throwOnAppMessage = true;  // the exception ends at the framework's window procedure
+    wnd.m_throwOnAppMessage = true; // the exception ends at the framework's window procedure
     EXPECT_EQ(0, wnd.SendMessage(kAppMessage));
     EXPECT_TRUE(::IsWindow(wnd.m_hWnd));
 }

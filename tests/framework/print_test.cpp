@@ -11,17 +11,16 @@ namespace {
 
 // Ids of the standard print dialog template's radio buttons.
 constexpr int kAllPagesButton = 1056;  // rad1
-constexpr int kSelectionButton = 1057;  // rad2
-constexpr int kPageRangeButton = 1058;  // rad3
+constexpr int kSelectionButton = 1057; // rad2
+constexpr int kPageRangeButton = 1058; // rad3
 
 // A print dialog that looks at its real controls when it opens, then closes
 // itself from there.
-class CInspectingPrintDialog : public CPrintDialog
-{
+class CInspectingPrintDialog : public CPrintDialog {
 public:
     explicit CInspectingPrintDialog(UINT closeCommand)
         : CPrintDialog(FALSE, PD_SELECTION | PD_USEDEVMODECOPIES), m_closeCommand(closeCommand)
-    { }
+    {}
 
     int m_initCount = 0;
     bool m_attachedToDialog = false;
@@ -32,8 +31,7 @@ public:
         const BOOL result = CPrintDialog::OnInitDialog();
         ++m_initCount;
         // Attached and subclassed, so the dialog's messages reach this object.
-        m_attachedToDialog = CWnd::FromHandlePermanent(m_hWnd) == this
-            && ::GetWindowLongPtrA(m_hWnd, GWLP_WNDPROC) == reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc());
+        m_attachedToDialog = CWnd::FromHandlePermanent(m_hWnd) == this && ::GetWindowLongPtrA(m_hWnd, GWLP_WNDPROC) == reinterpret_cast<LONG_PTR>(AfxGetAfxWndProc());
         CheckRadioButton(kAllPagesButton, kPageRangeButton, kSelectionButton);
         m_selectionChecked = IsDlgButtonChecked(kSelectionButton);
         PostMessage(WM_COMMAND, MAKEWPARAM(m_closeCommand, BN_CLICKED), 0);
@@ -44,8 +42,7 @@ private:
     const UINT m_closeCommand;
 };
 
-class PrintTest : public framework_test::WindowTest
-{
+class PrintTest : public framework_test::WindowTest {
 protected:
     // Without a printer the system's print dialog would wait for the user to
     // dismiss its complaint, so the printer tests need one.
@@ -58,7 +55,7 @@ protected:
     }
 };
 
-}  // namespace
+} // namespace
 
 TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
 {
@@ -74,7 +71,7 @@ TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
         EXPECT_EQ(nullptr, dialog.m_hWnd);
         if (closeCommand == IDOK) {
             EXPECT_NE(nullptr, dialog.GetPrinterDC());
-            EXPECT_TRUE(dialog.PrintSelection());  // the selection button was checked in OnInitDialog
+            EXPECT_TRUE(dialog.PrintSelection()); // the selection button was checked in OnInitDialog
             EXPECT_FALSE(dialog.GetDeviceName().IsEmpty());
         }
         // The printer handles belong to the caller.
@@ -87,7 +84,7 @@ TEST_F(PrintTest, DialogInitialisesOnTheRealDialogAndClosesFromThere)
 TEST_F(PrintTest, PrintInfoMakesItsDialogWithFrameworkFlagsAndFullPageRangeAndOwnsIt)
 {
     struct CCountedDialog : CPrintDialog {
-        explicit CCountedDialog(int& destroyed) : CPrintDialog(FALSE), m_destroyed(destroyed) { }
+        explicit CCountedDialog(int& destroyed) : CPrintDialog(FALSE), m_destroyed(destroyed) {}
         ~CCountedDialog() override { ++m_destroyed; }
         int& m_destroyed;
     };
@@ -113,11 +110,11 @@ TEST_F(PrintTest, ApplicationKeepsOnePrinterDefaultAndPrinterDcsComeFromIt)
     CWinApp app;
     CPrintInfo info;
     PRINTDLG& pd = info.m_pPD->m_pd;
-    EXPECT_EQ(nullptr, info.m_pPD->CreatePrinterDC());  // no printer data yet
+    EXPECT_EQ(nullptr, info.m_pPD->CreatePrinterDC()); // no printer data yet
     ASSERT_TRUE(app.GetPrinterDeviceDefaults(&pd));
     EXPECT_NE(nullptr, pd.hDevMode);
     PRINTDLG again = {};
-    ASSERT_TRUE(app.GetPrinterDeviceDefaults(&again));  // lent again, not taken anew
+    ASSERT_TRUE(app.GetPrinterDeviceDefaults(&again)); // lent again, not taken anew
     EXPECT_EQ(app.m_hDevNames, pd.hDevNames);
     EXPECT_EQ(pd.hDevNames, again.hDevNames);
     EXPECT_EQ(pd.hDevMode, again.hDevMode);

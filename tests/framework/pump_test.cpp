@@ -13,10 +13,9 @@ namespace {
 
 constexpr UINT kProbeMessage = WM_APP + 20;
 
-class CRecordingWnd : public CWnd
-{
+class CRecordingWnd : public CWnd {
 public:
-    explicit CRecordingWnd(std::vector<CWnd*>& order) : m_order(order) { }
+    explicit CRecordingWnd(std::vector<CWnd*>& order) : m_order(order) {}
     BOOL PreTranslateMessage(MSG* pMsg) override
     {
         if (pMsg->message != kProbeMessage)
@@ -37,36 +36,35 @@ private:
     std::vector<CWnd*>& m_order;
 };
 
-class PumpTest : public framework_test::WindowTest
-{
+class PumpTest : public framework_test::WindowTest {
 protected:
     void SetUp() override
     {
         ASSERT_TRUE(m_top.CreateEx(0, NULL, "top", WS_OVERLAPPEDWINDOW, 0, 0, 200, 200, NULL, NULL));
         ASSERT_TRUE(m_middle.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 100, 100), &m_top, 1));
         ASSERT_TRUE(m_leaf.Create(NULL, NULL, WS_VISIBLE, CRect(0, 0, 50, 50), &m_middle, 2));
-        framework_test::DispatchPendingMessages();  // the probe is the next message
+        framework_test::DispatchPendingMessages(); // the probe is the next message
     }
 
     std::vector<CWnd*> m_order;
-    CRecordingWnd m_top {m_order};
-    CRecordingWnd m_middle {m_order};
-    CRecordingWnd m_leaf {m_order};
+    CRecordingWnd m_top{m_order};
+    CRecordingWnd m_middle{m_order};
+    CRecordingWnd m_leaf{m_order};
 };
 
-}  // namespace
+} // namespace
 
 TEST_F(PumpTest, PreTranslateSeesTargetThenEachParentWithOrWithoutApplication)
 {
     ASSERT_EQ(nullptr, AfxGetApp());
     ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
     ASSERT_TRUE(AfxPumpMessage());
-    EXPECT_EQ((std::vector<CWnd*> {&m_leaf, &m_middle, &m_top}), m_order);
+    EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle, &m_top}), m_order);
     m_order.clear();
     CWinApp app;
     ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
     ASSERT_TRUE(app.PumpMessage());
-    EXPECT_EQ((std::vector<CWnd*> {&m_leaf, &m_middle, &m_top}), m_order);
+    EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle, &m_top}), m_order);
     EXPECT_EQ(2, m_leaf.m_dispatched);
 }
 
@@ -76,7 +74,7 @@ TEST_F(PumpTest, WindowThatTakesMessageEndsWalkAndDispatch)
     CWinApp app;
     ASSERT_TRUE(m_leaf.PostMessage(kProbeMessage));
     ASSERT_TRUE(app.PumpMessage());
-    EXPECT_EQ((std::vector<CWnd*> {&m_leaf, &m_middle}), m_order);
+    EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle}), m_order);
     EXPECT_EQ(0, m_leaf.m_dispatched);
 }
 
@@ -84,7 +82,7 @@ TEST_F(PumpTest, WalkStopsAtTheStopWindow)
 {
     MSG msg = {m_leaf.m_hWnd, kProbeMessage, 0, 0, 0, {0, 0}};
     EXPECT_FALSE(CWnd::WalkPreTranslateTree(m_middle.m_hWnd, &msg));
-    EXPECT_EQ((std::vector<CWnd*> {&m_leaf, &m_middle}), m_order);
+    EXPECT_EQ((std::vector<CWnd*>{&m_leaf, &m_middle}), m_order);
 }
 
 TEST_F(PumpTest, WindowOutsideMainWindowIsAlsoOfferedToMainWindow)
@@ -96,8 +94,8 @@ TEST_F(PumpTest, WindowOutsideMainWindowIsAlsoOfferedToMainWindow)
     app.m_pMainWnd = &m_top;
     ASSERT_TRUE(popup.PostMessage(kProbeMessage));
     ASSERT_TRUE(app.PumpMessage());
-    EXPECT_EQ((std::vector<CWnd*> {&popup}), order);
-    EXPECT_EQ((std::vector<CWnd*> {&m_top}), m_order);
+    EXPECT_EQ((std::vector<CWnd*>{&popup}), order);
+    EXPECT_EQ((std::vector<CWnd*>{&m_top}), m_order);
     app.m_pMainWnd = NULL;
 }
 

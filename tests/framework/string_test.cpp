@@ -9,7 +9,7 @@
 
 namespace {
 std::string Text(const CString& value) { return static_cast<LPCSTR>(value); }
-}  // namespace
+} // namespace
 
 TEST(CStringBuilding, ConstructionAndConcatenationGiveTextAndLength)
 {
@@ -18,7 +18,7 @@ TEST(CStringBuilding, ConstructionAndConcatenationGiveTextAndLength)
     grown += static_cast<LPCSTR>(NULL);
     CString original("Tavo");
     const CString copy(original);
-    original += "def";  // the copy keeps its own text
+    original += "def"; // the copy keeps its own text
     const CString ab("ab");
     const struct {
         CString value;
@@ -73,6 +73,6 @@ TEST(CStringBadInput, OutOfRangePositionsClampOrAreIgnored)
     EXPECT_EQ('\0', text.GetAt(50));
     text.SetAt(50, 'z');
     EXPECT_EQ("0123456789", Text(text));
-    EXPECT_FALSE(text.LoadString(60123));  // no such string: the text stays
+    EXPECT_FALSE(text.LoadString(60123)); // no such string: the text stays
     EXPECT_EQ("0123456789", Text(text));
 }

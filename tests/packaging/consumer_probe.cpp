@@ -40,7 +40,10 @@ bool WaitFor(const std::function<bool()>& condition)
 
 HWND VisibleWindowOf(DWORD processId)
 {
-    struct Search { DWORD processId; HWND found; } search = {processId, nullptr};
+    struct Search {
+        DWORD processId;
+        HWND found;
+    } search = {processId, nullptr};
     EnumWindows(
         [](HWND window, LPARAM param) -> BOOL {
             auto* s = reinterpret_cast<Search*>(param);
@@ -133,7 +136,7 @@ const char* Probe(PROCESS_INFORMATION& viewer, COLORREF pond)
     return status == 0 ? nullptr : "the viewer ended with a failure status";
 }
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv)
 {

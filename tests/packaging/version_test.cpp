@@ -29,8 +29,8 @@ std::string VersionText(std::vector<char>& block, const std::string& name)
     UINT length = 0;
     const std::string path = "\\StringFileInfo\\040904B0\\" + name;
     return VerQueryValueA(block.data(), path.c_str(), reinterpret_cast<void**>(&value), &length) && value != nullptr
-               ? value
-               : "";
+        ? value
+        : "";
 }
 
 TEST(Version, TheGeneratedHeaderCarriesTheProjectVersion)
@@ -43,7 +43,7 @@ TEST(Version, TheGeneratedHeaderCarriesTheProjectVersion)
 
 TEST(Version, EachDllCarriesTheVersionItsNameAndADescription)
 {
-    Tavo_WiLibrary::Initialize();  // the first call into the library: all three DLLs are loaded
+    Tavo_WiLibrary::Initialize(); // the first call into the library: all three DLLs are loaded
     const DWORD high = MAKELONG(TAVO_VERSION_MINOR, TAVO_VERSION_MAJOR);
     const DWORD low = MAKELONG(0, TAVO_VERSION_PATCH);
     for (const char* dll : {"afx.dll", "libTavo_Core.dll", "libTavo_Windows.dll"}) {
@@ -73,4 +73,4 @@ TEST(Version, EachDllCarriesTheVersionItsNameAndADescription)
     Tavo_WiLibrary::Terminate(false);
 }
 
-}  // namespace
+} // namespace

@@ -59,7 +59,7 @@ TEST(DibSection, GdiDrawingIsReadBackFromTheBits)
     BITMAPINFO bi = {};
     bi.bmiHeader.biSize = sizeof(bi.bmiHeader);
     bi.bmiHeader.biWidth = 16;
-    bi.bmiHeader.biHeight = -16;  // top-down: row 0 is the top
+    bi.bmiHeader.biHeight = -16; // top-down: row 0 is the top
     bi.bmiHeader.biPlanes = 1;
     bi.bmiHeader.biBitCount = 32;
     bi.bmiHeader.biCompression = BI_RGB;
@@ -169,4 +169,4 @@ TEST(DefaultPrinter, PrintsAPostScriptPageToAFile)
     DeleteFileA(output.c_str());
 }
 
-}  // namespace
+} // namespace

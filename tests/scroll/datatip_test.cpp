@@ -46,8 +46,7 @@ Notes Notifications()
     return result;
 }
 
-class DataTipTest : public ::testing::Test
-{
+class DataTipTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -142,4 +141,4 @@ TEST_F(DataTipTest, DestroyedTipIsNoLongerTheCurrentTip)
     EXPECT_EQ(unborn.IsVisible(), 0);
 }
 
-}  // namespace
+} // namespace

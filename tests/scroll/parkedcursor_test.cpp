@@ -14,8 +14,7 @@ namespace {
 constexpr int HostX = 200;
 constexpr int HostY = 150;
 
-class ParkedCursorTest : public ::testing::Test
-{
+class ParkedCursorTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -56,7 +55,7 @@ protected:
         return result;
     }
 
-    TestWindow host{CRect(HostX, HostY, HostX + 400, HostY + 300)};   // shown and activated
+    TestWindow host{CRect(HostX, HostY, HostX + 400, HostY + 300)}; // shown and activated
     TestWindow owner{CRect(0, 0, 300, 200), host.Handle()};
     Tavo_WiParkedCursorMonitor monitor;
 };
@@ -70,7 +69,7 @@ TEST_F(ParkedCursorTest, RestBeginsWhenTheTimerFiresAfterAMoveAndEndsOnlyAtAMove
     // The park point is where the pointer is, in the owner's client coordinates.
     EXPECT_EQ(monitor.GetParkPoint(), CPoint(30, 40));
 
-    MoveAndFire(30, 40);   // would end and begin the rest again had the move restarted the timer
+    MoveAndFire(30, 40); // would end and begin the rest again had the move restarted the timer
     Relay(WM_NCMOUSEMOVE, 90, 90);
     Relay(WM_MOUSEWHEEL, 90, 90, MAKEWPARAM(0, 120));
     Relay(WM_KEYDOWN, 0, 0, 'A');
@@ -132,7 +131,7 @@ TEST_F(ParkedCursorTest, DisablingStopsThePendingTimerAndKeepsARestUntilTheNextM
 
 TEST_F(ParkedCursorTest, NoRestOverAnInactiveApplication)
 {
-    TestWindow other(CRect(700, 600, 800, 700));   // activates itself
+    TestWindow other(CRect(700, 600, 800, 700)); // activates itself
     ASSERT_EQ(::GetActiveWindow(), other.Handle());
     EXPECT_EQ(MoveAndFire(30, 40), 0);
     EXPECT_TRUE(Notifications().empty());
@@ -141,11 +140,11 @@ TEST_F(ParkedCursorTest, NoRestOverAnInactiveApplication)
 TEST_F(ParkedCursorTest, RestEndsSilentlyOnceTheOwnerIsGone)
 {
     ASSERT_EQ(MoveAndFire(30, 40), 1);
-    ::DestroyWindow(owner.Handle());   // takes the monitor's window with it
+    ::DestroyWindow(owner.Handle()); // takes the monitor's window with it
     EXPECT_EQ(monitor.GetSafeHwnd(), nullptr);
     Relay(WM_MOUSEMOVE, 31, 40);
     EXPECT_EQ(monitor.IsParked(), 0);
     EXPECT_EQ(Notifications(), std::vector<WPARAM>{1});
 }
 
-}  // namespace
+} // namespace

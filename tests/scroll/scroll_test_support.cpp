@@ -27,7 +27,7 @@ const char* TestWindowClass()
     return name;
 }
 
-}  // namespace
+} // namespace
 
 void PumpPending()
 {
@@ -131,4 +131,4 @@ CRect ChildRect(HWND child)
     return rect;
 }
 
-}  // namespace ScrollTest
+} // namespace ScrollTest

@@ -36,10 +36,13 @@ DWORD FreshTime();
 // activated top-level window at a screen rectangle when parent is null, a
 // visible child at a client rectangle otherwise. Every registered message
 // any of them receives is noted, in order.
-class TestWindow
-{
+class TestWindow {
 public:
-    struct Note { HWND window; UINT message; WPARAM wParam; };
+    struct Note {
+        HWND window;
+        UINT message;
+        WPARAM wParam;
+    };
 
     explicit TestWindow(const CRect& rect, HWND parent = nullptr);
     ~TestWindow();
@@ -57,8 +60,7 @@ private:
 };
 
 // One call of a scroll window's virtual operation.
-struct Call
-{
+struct Call {
     std::string name;
     UINT button = 0;
     UINT flags = 0;
@@ -68,18 +70,17 @@ struct Call
     bool operator==(const Call& other) const
     {
         return std::tie(name, button, flags, point.x, point.y, completed) ==
-               std::tie(other.name, other.button, other.flags, other.point.x, other.point.y, other.completed);
+            std::tie(other.name, other.button, other.flags, other.point.x, other.point.y, other.completed);
     }
 };
 std::ostream& operator<<(std::ostream& out, const Call& call);
 
 // A scroll window that records the calls of its virtual operations.
-class RecordingScrollWnd : public Tavo_WiScrollWnd
-{
+class RecordingScrollWnd : public Tavo_WiScrollWnd {
 public:
     std::vector<Call> calls;
-    CString dataTipText;                                    // answered by GetDataTipText
-    std::function<void(Tavo_WiScrollee*, CDC*)> painter;   // paints the view when set
+    CString dataTipText;                                 // answered by GetDataTipText
+    std::function<void(Tavo_WiScrollee*, CDC*)> painter; // paints the view when set
 
     long Count(const std::string& name) const
     {
@@ -87,7 +88,11 @@ public:
     }
     void Clear() { calls.clear(); }
 
-    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override { if (painter) painter(scrollee, dc); }
+    void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc) override
+    {
+        if (painter)
+            painter(scrollee, dc);
+    }
     // Records only the calls that really move pixels.
     void GetScrollDeviceDeltas(const CPoint& a, const CPoint& b, int& dx, int& dy, int scrolling) override
     {
@@ -137,7 +142,7 @@ inline COLORREF PixelAt(HWND window, int x, int y) { return CClientDC(CWnd::From
 // The window rectangle of child in its parent's client coordinates.
 CRect ChildRect(HWND child);
 
-}  // namespace ScrollTest
+} // namespace ScrollTest
 
 // Readable values in test failures.
 inline void PrintTo(const CRect& r, std::ostream* out)

@@ -26,13 +26,12 @@ constexpr DWORD RightDown = MOUSEEVENTF_RIGHTDOWN;
 constexpr DWORD RightUp = MOUSEEVENTF_RIGHTUP;
 constexpr DWORD MoveOnly = 0;
 
-class ScrolleeTest : public ::testing::Test
-{
+class ScrolleeTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
         ASSERT_TRUE(wnd.Create(WS_CHILD | WS_VISIBLE, CRect(0, 0, WndWidth, WndHeight), host.Wnd(), 5));
-        wnd.SetScrollDone();   // the default range needs no bars: the scrollee fills the window
+        wnd.SetScrollDone(); // the default range needs no bars: the scrollee fills the window
         PumpPending();
         ASSERT_EQ(ChildRect(Scrollee()), CRect(0, 0, WndWidth, WndHeight));
         base = FreshTime();
@@ -72,16 +71,19 @@ protected:
 TEST_F(ScrolleeTest, ReleaseBeforeHoldTimeIsAClickWithTheReleasesFlagsAndPointAndAtItNothing)
 {
     // Presses 400 ms apart, the same button never twice in a row, so that no two make a double click.
-    const struct { DWORD down, up; UINT button; DWORD held; } presses[] = {
-        {LeftDown, LeftUp, MK_LBUTTON, 299}, {RightDown, RightUp, MK_RBUTTON, 299},
-        {MOUSEEVENTF_MIDDLEDOWN, MOUSEEVENTF_MIDDLEUP, MK_MBUTTON, 299}, {LeftDown, LeftUp, MK_LBUTTON, 300}};
+    const struct {
+        DWORD down, up;
+        UINT button;
+        DWORD held;
+    } presses[] = {
+        {LeftDown, LeftUp, MK_LBUTTON, 299}, {RightDown, RightUp, MK_RBUTTON, 299}, {MOUSEEVENTF_MIDDLEDOWN, MOUSEEVENTF_MIDDLEUP, MK_MBUTTON, 299}, {LeftDown, LeftUp, MK_LBUTTON, 300}};
     DWORD time = 100;
     for (const auto& p : presses) {
         SCOPED_TRACE(testing::Message() << p.button << " held " << p.held);
         wnd.Clear();
         Input(p.down, CPoint(50, 60), time);
         Input(p.up, CPoint(53, 64), time + p.held);
-        FireHoldTimer();   // killed by the release: starts nothing
+        FireHoldTimer(); // killed by the release: starts nothing
         const std::vector<Call> click = {{"Click", p.button, 0, {53, 64}}};
         EXPECT_EQ(wnd.calls, p.held < 300 ? click : std::vector<Call>{});
         time += 400;
@@ -102,7 +104,7 @@ TEST_F(ScrolleeTest, PressReleaseDoubleClickReleaseIsAClickThenADoubleClick)
     Input(LeftDown, CPoint(40, 40), 1000);
     Input(LeftUp, CPoint(40, 40), 1050);
     Input(LeftDown, CPoint(40, 40), 1100);
-    FireHoldTimer();   // holding the second press starts no drag
+    FireHoldTimer(); // holding the second press starts no drag
     Input(LeftUp, CPoint(40, 40), 1150);
     EXPECT_EQ(wnd.calls,
               (std::vector<Call>{{"Click", MK_LBUTTON, 0, {40, 40}}, {"DoubleClick", MK_LBUTTON, MK_LBUTTON, {40, 40}}}));
@@ -111,17 +113,16 @@ TEST_F(ScrolleeTest, PressReleaseDoubleClickReleaseIsAClickThenADoubleClick)
 TEST_F(ScrolleeTest, HoldTimerStartsADragWhoseMovesNeedAButtonFlag)
 {
     Input(LeftDown, CPoint(50, 60), 1000);
-    Input(MoveOnly, CPoint(70, 80), 1100);   // moves before the drag are not reported
+    Input(MoveOnly, CPoint(70, 80), 1100); // moves before the drag are not reported
     FireHoldTimer();
     EXPECT_EQ(::GetCapture(), Scrollee());
     ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(5, 6));
     // Any of the three button flags will do; the pressed button is reported.
     ::SendMessageA(Scrollee(), WM_MOUSEMOVE, MK_RBUTTON, MAKELPARAM(7, 8));
-    Input(MoveOnly, CPoint(450, 60), 1400);   // outside the scrollee, inside the host
+    Input(MoveOnly, CPoint(450, 60), 1400); // outside the scrollee, inside the host
     Input(LeftUp, CPoint(450, 60), 1500);
     const std::vector<Call> expected = {
-        {"DragStart", MK_LBUTTON, MK_LBUTTON, {50, 60}}, {"DragMove", MK_LBUTTON, MK_RBUTTON, {7, 8}},
-        {"DragMove", MK_LBUTTON, MK_LBUTTON, {450, 60}}, {"DragEnd", MK_LBUTTON, 0, {450, 60}, 1}};
+        {"DragStart", MK_LBUTTON, MK_LBUTTON, {50, 60}}, {"DragMove", MK_LBUTTON, MK_RBUTTON, {7, 8}}, {"DragMove", MK_LBUTTON, MK_LBUTTON, {450, 60}}, {"DragEnd", MK_LBUTTON, 0, {450, 60}, 1}};
     EXPECT_EQ(wnd.calls, expected);
     EXPECT_EQ(::GetCapture(), nullptr) << "the drag's capture is released";
 }
@@ -215,7 +216,11 @@ bool EnglishLocale() { return (::GetUserDefaultLCID() & 0x3FF) == LANG_ENGLISH; 
 TEST_F(ScrolleeTest, WindowsUseTheLibrarysOwnClassesUnderEnglishOnly)
 {
     const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();
-    const struct { HWND hwnd; const char* name; ULONG_PTR style; } windows[] = {
+    const struct {
+        HWND hwnd;
+        const char* name;
+        ULONG_PTR style;
+    } windows[] = {
         {wnd.GetSafeHwnd(), "Tavo_WiScrollWnd", CS_DBLCLKS | CS_PARENTDC},
         {Scrollee(), "Tavo_WiScrollee", CS_DBLCLKS | CS_PARENTDC},
         {::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId), "Tavo_WiParkedCursorWnd", CS_PARENTDC},
@@ -246,4 +251,4 @@ TEST(ScrollLocale, ProcessRunsUnderTheExpectedLanguage)
     EXPECT_EQ(static_cast<int>(::GetUserDefaultLCID() & 0x3FF), std::atoi(expected));
 }
 
-}  // namespace
+} // namespace

@@ -40,8 +40,7 @@ void SetSquareModel(RecordingScrollWnd& wnd, const CPoint& position)
     wnd.Clear();
 }
 
-class ScrollWndTest : public ::testing::Test
-{
+class ScrollWndTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -67,9 +66,12 @@ protected:
 
 TEST(ScrollMath, BarUnitsRoundAwayFromZeroUnlessWhole)
 {
-    const struct { int value; double scale; int expected; } cases[] = {
-        {3, 2.0, 2},   {4, 2.0, 2}, {5, 2.0, 3},           {-3, 2.0, -2},         {-4, 2.0, -2},
-        {-5, 2.0, -3}, {0, 2.0, 0}, {INT_MAX, 1.0, INT_MAX}, {INT_MIN, 1.0, INT_MIN}};
+    const struct {
+        int value;
+        double scale;
+        int expected;
+    } cases[] = {
+        {3, 2.0, 2}, {4, 2.0, 2}, {5, 2.0, 3}, {-3, 2.0, -2}, {-4, 2.0, -2}, {-5, 2.0, -3}, {0, 2.0, 0}, {INT_MAX, 1.0, INT_MAX}, {INT_MIN, 1.0, INT_MIN}};
     for (const auto& c : cases)
         EXPECT_EQ(Tavo_WiScrollMath::ToBarUnits(c.value, c.scale), c.expected) << c.value << " / " << c.scale;
 }
@@ -77,7 +79,10 @@ TEST(ScrollMath, BarUnitsRoundAwayFromZeroUnlessWhole)
 TEST_F(ScrollWndTest, BarsHoldTheRangeScaledToTheirLimitWithItsEndsRoundedOutwards)
 {
     // Ranges as (x minimum, y minimum, x maximum, y maximum), the bars' likewise.
-    const struct { CRect range, bars; CPoint lowest, highest; } cases[] = {
+    const struct {
+        CRect range, bars;
+        CPoint lowest, highest;
+    } cases[] = {
         // Twice the bar limit: scale 2.0 on x only.
         {{0, 0, 2 * 32767, 100}, {0, 0, 32767, 100}, {0, 0}, {2 * 32767, 100}},
         // Empty and reversed ranges are 100 units wide.
@@ -158,11 +163,22 @@ TEST_F(ScrollWndTest, EveryScrollCodeMovesToItsTargetAndTheBarShowsIt)
     // From (500, 500): the target normally and with y inverted (y grows
     // upwards, so up is towards the maximum; the flag leaves x alone). 100
     // and 101 step back and forward by n percent of the window extent.
-    const struct { UINT code; int n; int normal, invertedY; } cases[] = {
-        {SB_LINEUP, 0, 490, 510},        {SB_LINEDOWN, 0, 510, 490},          {SB_PAGEUP, 0, 450, 550},
-        {SB_PAGEDOWN, 0, 550, 450},      {SB_THUMBTRACK, 200, 200, 800},      {SB_THUMBPOSITION, 321, 321, 679},
-        {SB_TOP, 0, 0, 1000},            {SB_BOTTOM, 0, 900, 100},            {100, 25, 475, 525},
-        {101, 25, 525, 475},             {42, 0, 500, 500},
+    const struct {
+        UINT code;
+        int n;
+        int normal, invertedY;
+    } cases[] = {
+        {SB_LINEUP, 0, 490, 510},
+        {SB_LINEDOWN, 0, 510, 490},
+        {SB_PAGEUP, 0, 450, 550},
+        {SB_PAGEDOWN, 0, 550, 450},
+        {SB_THUMBTRACK, 200, 200, 800},
+        {SB_THUMBPOSITION, 321, 321, 679},
+        {SB_TOP, 0, 0, 1000},
+        {SB_BOTTOM, 0, 900, 100},
+        {100, 25, 475, 525},
+        {101, 25, 525, 475},
+        {42, 0, 500, 500},
     };
     for (UINT message : {WM_HSCROLL, WM_VSCROLL})
         for (int inverted : {0, 1})
@@ -221,9 +237,12 @@ TEST_F(ScrollWndTest, PercentStepsTruncateHorizontallyAndRoundVertically)
     wnd.SetScrollWindowExtent(101, 101);
     wnd.SetScrollPosition(CPoint(1000, 5000));
     // A negative percentage scrolls nothing.
-    const struct { Tavo_WiScroll::Dir dir; int n; CPoint expected; } steps[] = {
-        {Up, 50, {1000, 5051}}, {Right, 50, {1050, 5051}}, {Down, 50, {1050, 5000}},
-        {Left, 50, {1000, 5000}}, {Right, -30, {1000, 5000}}, {Down, -30, {1000, 5000}}};
+    const struct {
+        Tavo_WiScroll::Dir dir;
+        int n;
+        CPoint expected;
+    } steps[] = {
+        {Up, 50, {1000, 5051}}, {Right, 50, {1050, 5051}}, {Down, 50, {1050, 5000}}, {Left, 50, {1000, 5000}}, {Right, -30, {1000, 5000}}, {Down, -30, {1000, 5000}}};
     for (const auto& step : steps) {
         wnd.ScrollWindow(step.dir, Tavo_WiScroll::Percent, step.n);
         EXPECT_EQ(wnd.GetScrollPosition(), step.expected) << step.dir << " " << step.n;
@@ -271,9 +290,7 @@ TEST_F(ScrollWndTest, ThumbCodesDragScrollAndTheEndCodeEndsWhicheverScrollRan)
     SendScroll(WM_VSCROLL, SB_ENDSCROLL);
 
     const std::vector<Call> expected = {
-        {"DragScrollStart", 0, 0, {500, 500}}, {"ScrollDeltas", 0, 0, {300, 500}}, {"DragScrollMove", 0, 0, {300, 500}},
-        {"ScrollDeltas", 0, 0, {310, 500}},    {"DragScrollMove", 0, 0, {310, 500}}, {"DragScrollEnd", 0, 0, {310, 500}},
-        {"ScrollDeltas", 0, 0, {310, 510}},    {"NonDragScrollEnd", 0, 0, {310, 510}}};
+        {"DragScrollStart", 0, 0, {500, 500}}, {"ScrollDeltas", 0, 0, {300, 500}}, {"DragScrollMove", 0, 0, {300, 500}}, {"ScrollDeltas", 0, 0, {310, 500}}, {"DragScrollMove", 0, 0, {310, 500}}, {"DragScrollEnd", 0, 0, {310, 500}}, {"ScrollDeltas", 0, 0, {310, 510}}, {"NonDragScrollEnd", 0, 0, {310, 510}}};
     EXPECT_EQ(wnd.calls, expected);
 }
 
@@ -325,7 +342,11 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
     wnd.painter = nullptr;
 
     // 13 units right moves the content 13 pixels left, then 5 units back 5 pixels right.
-    const struct { int x; CRect strip; int firstKept, lastKept; } steps[] = {
+    const struct {
+        int x;
+        CRect strip;
+        int firstKept, lastKept;
+    } steps[] = {
         {13, {WndWidth - 13, 0, WndWidth, WndHeight}, 0, WndWidth - 13}, {8, {0, 0, 5, WndHeight}, 5, WndWidth - 13}};
     for (const auto& step : steps) {
         SCOPED_TRACE(step.x);
@@ -342,7 +363,7 @@ TEST_F(ScrollWndTest, ScrollWindowToMovesThePaintedPixelsAndInvalidatesOnlyTheSt
 TEST_F(ScrollWndTest, DestructionTakesEveryWindowOfTheFamilyWithIt)
 {
     const HWND monitor = ::GetDlgItem(Scrollee(), Tavo_WiParkedCursorMonitor::ControlId);
-    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd();   // an owned popup, no child
+    const HWND tip = wnd.GetScrollee()->GetDataTip()->GetSafeHwnd(); // an owned popup, no child
     std::vector<HWND> family = {wnd.GetSafeHwnd(), Scrollee(), monitor, tip, HorzBar(), VertBar(), Corner()};
     for (HWND hwnd : family)
         ASSERT_TRUE(::IsWindow(hwnd));
@@ -359,4 +380,4 @@ TEST_F(ScrollWndTest, DestructionTakesEveryWindowOfTheFamilyWithIt)
         EXPECT_FALSE(::IsWindow(hwnd));
 }
 
-}  // namespace
+} // namespace

@@ -30,8 +30,7 @@ constexpr UINT_PTR HoldTimer = Tavo_WiScrollee::HoldTimerId;
 // Redirects one import of one of the library's modules to a function of the
 // test while it lives.
 template <class Function>
-class Fault
-{
+class Fault {
 public:
     Fault(const char* module, const char* name, Function replacement)
         : m_patch(::GetModuleHandleA(module), name, reinterpret_cast<void*>(replacement))
@@ -68,14 +67,15 @@ void* __cdecl NoMemoryForAMapping(size_t size)
 
 // A host with the sample drawing bound and zoomed in, so that drags pan, and
 // a census of what the process holds before it existed.
-class FaultTest : public ::testing::Test
-{
+class FaultTest : public ::testing::Test {
 protected:
     void SetUp() override
     {
         // One window first, so that what the library makes once per process
         // (the data tip's shared objects, the window classes) is there.
-        { SoakHost warmUp(CRect(50, 50, 450, 350)); }
+        {
+            SoakHost warmUp(CRect(50, 50, 450, 350));
+        }
         PumpPending();
         before = TakeCensus(&ledger);
         host = std::make_unique<SoakHost>(CRect(50, 50, 550, 450));
@@ -145,16 +145,16 @@ TEST_F(FaultTest, CaptureTakenInAPanDragEndsItAndTheDueTickScrollsOnceWithoutReA
 {
     StartDrag(250, 200);
     ASSERT_TRUE(wnd().IsDragScrolling());
-    Mouse(MoveOnly, -40, 200);                  // out of the view: autoscroll
+    Mouse(MoveOnly, -40, 200); // out of the view: autoscroll
     ASSERT_TRUE(ledger.HasTimer(wnd().GetSafeHwnd(), AutoScrollTimer));
-    const CPoint before = wnd().GetScrollPosition();
+    const CPoint position = wnd().GetScrollPosition();
 
     SoakHost thief(CRect(600, 50, 700, 150));
     ::SetCapture(thief.Handle());
     PumpPending();
     EXPECT_FALSE(wnd().IsDragScrolling()) << "the drag ended with the capture";
     ::SendMessageA(wnd().GetSafeHwnd(), WM_TIMER, AutoScrollTimer, 0);
-    EXPECT_NE(wnd().GetScrollPosition(), before) << "the tick already due still scrolls";
+    EXPECT_NE(wnd().GetScrollPosition(), position) << "the tick already due still scrolls";
     EXPECT_FALSE(ledger.HasTimer(wnd().GetSafeHwnd(), AutoScrollTimer)) << "and does not re-arm";
     Mouse(MOUSEEVENTF_LEFTUP, -40, 200);
     EXPECT_EQ(::GetCapture(), thief.Handle());
@@ -168,7 +168,7 @@ TEST_F(FaultTest, CaptureTakenInARubberRectangleCancelsItWithNothingReported)
     wnd().dragAction = Tavo_WiDrawWnd::RubberRectangle;
     wnd().onPaint = [&] { ::SetCapture(thief->Handle()); };
     Mouse(MOUSEEVENTF_LEFTDOWN, 100, 100);
-    ::SetCapture(host->Scrollee());     // as the hold time would, so the queue below is the view's
+    ::SetCapture(host->Scrollee()); // as the hold time would, so the queue below is the view's
     ScrollTest::SendMouse(MoveOnly, Screen(200, 150), time += 40);
     ::InvalidateRect(host->Scrollee(), nullptr, FALSE);
     ::SendMessageA(host->Scrollee(), WM_TIMER, HoldTimer, 0);
@@ -281,8 +281,7 @@ TEST_F(FaultTest, EscapeHeldDuringAPaintStopsThePassAndTheNextPaintIsWhole)
 
 TEST_F(FaultTest, PrintingWithoutADefaultPrinterOrItsDeviceContextLaysOutOnePage)
 {
-    struct Case
-    {
+    struct Case {
         const char* name;
         const char* module;
         const char* function;
@@ -340,4 +339,4 @@ TEST_F(FaultTest, MemoryRunningOutWhileBindingLeavesTheWindowUnboundAndUsable)
     ExpectNothingLeftAfterTheHost();
 }
 
-}  // namespace
+} // namespace

@@ -23,7 +23,7 @@ void BuildDegenerate(Tavo_GrDrawingBuilder& build)
     build.AddRect(0, 0, 0, 0);
     build.AddRect(100, 0, 100, 500);
     build.AddRect(0, 100, 500, 100);
-    build.AddRect(500, 500, 300, 300);            // inverted: normalised by the builder
+    build.AddRect(500, 500, 300, 300); // inverted: normalised by the builder
     build.AddRect(INT_MAX, INT_MAX, INT_MIN, INT_MIN);
     build.AddCircle(250, 250, 0);
     build.AddCircle(250, 250, -50);
@@ -52,7 +52,7 @@ void BuildAbsurdText(Tavo_GrDrawingBuilder& build)
     build.AddText(-500, 0, std::string(100000, 'W').c_str());
 }
 
-}  // namespace
+} // namespace
 
 const char* NameOf(Kind kind)
 {
@@ -107,4 +107,4 @@ std::unique_ptr<Tavo_GrDrawing> Build(Kind kind, int crowd)
     return drawing;
 }
 
-}  // namespace Hostile
+} // namespace Hostile

@@ -17,15 +17,14 @@ constexpr char Blue = 1;
 constexpr char Red = 4;
 constexpr char White = 7;
 
-enum Kind
-{
-    Empty,            // no items
-    OnePoint,         // one dot at Point
-    FullRange,        // a red filled rectangle over the whole int range, a white one around the origin
-    Corners,          // red squares at the two ends of the int range, blue ones just inside
-    Degenerate,       // rectangles, lines, circles, triangles of no size, and inverted rectangles
-    Crowd,            // crowd filled red rectangles on CrowdSpot
-    AbsurdText,       // text up to INT_MAX world units high, a text box as high as the range, a long line
+enum Kind {
+    Empty,      // no items
+    OnePoint,   // one dot at Point
+    FullRange,  // a red filled rectangle over the whole int range, a white one around the origin
+    Corners,    // red squares at the two ends of the int range, blue ones just inside
+    Degenerate, // rectangles, lines, circles, triangles of no size, and inverted rectangles
+    Crowd,      // crowd filled red rectangles on CrowdSpot
+    AbsurdText, // text up to INT_MAX world units high, a text box as high as the range, a long line
     KindCount
 };
 
@@ -48,4 +47,4 @@ constexpr int MillionItems = 1000000;
 // A new drawing of the kind; crowd is the number of items of Crowd.
 std::unique_ptr<Tavo_GrDrawing> Build(Kind kind, int crowd = MillionItems);
 
-}  // namespace Hostile
+} // namespace Hostile

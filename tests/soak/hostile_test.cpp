@@ -42,11 +42,10 @@ bool SquareOnly(const DibCanvas& canvas, COLORREF colour)
 {
     const int square = SquareOfTheZeroLevel.Width() * SquareOfTheZeroLevel.Height();
     return Count(canvas, colour, SquareOfTheZeroLevel) == square &&
-           CountAll(canvas, Background) == Width * Height - square;
+        CountAll(canvas, Background) == Width * Height - square;
 }
 
-struct Picture
-{
+struct Picture {
     Hostile::Kind kind;
     const char* what;
     std::function<bool(const DibCanvas&)> holds;
@@ -66,8 +65,7 @@ const Picture ZeroLevelPictures[] = {
     {Hostile::Degenerate, "the red square of the inverted rectangle and a few blue pixels of the empty items",
      [](const DibCanvas& c) {
          const int blue = CountAll(c, Colour(Hostile::Blue));
-         return blue > 0 && blue <= 8 && Count(c, Colour(Hostile::Red), SquareOfTheZeroLevel) + blue >=
-                                             SquareOfTheZeroLevel.Width() * SquareOfTheZeroLevel.Height();
+         return blue > 0 && blue <= 8 && Count(c, Colour(Hostile::Red), SquareOfTheZeroLevel) + blue >= SquareOfTheZeroLevel.Width() * SquareOfTheZeroLevel.Height();
      }},
     {Hostile::Crowd, "the red square of one of its rectangles",
      [](const DibCanvas& c) { return SquareOnly(c, Colour(Hostile::Red)); }},
@@ -78,8 +76,7 @@ const Picture ZeroLevelPictures[] = {
 };
 
 // Zoomed to a world rectangle, the middle of the view shows a colour.
-struct ZoomedPicture
-{
+struct ZoomedPicture {
     Hostile::Kind kind;
     Tavo_GrWRect rect;
     char colour;
@@ -91,12 +88,10 @@ const ZoomedPicture ZoomedPictures[] = {
     {Hostile::Corners, Hostile::HighCorner, Hostile::Red},
     {Hostile::Corners, Hostile::LowInside, Hostile::Blue},
     {Hostile::Crowd, {150, 150, 151, 151}, Hostile::Red},
-    {Hostile::OnePoint, {Hostile::Point.x - 1, Hostile::Point.y - 1, Hostile::Point.x + 1, Hostile::Point.y + 1},
-     Hostile::White},
+    {Hostile::OnePoint, {Hostile::Point.x - 1, Hostile::Point.y - 1, Hostile::Point.x + 1, Hostile::Point.y + 1}, Hostile::White},
 };
 
-class HostileDrawingTest : public ::testing::TestWithParam<Hostile::Kind>
-{
+class HostileDrawingTest : public ::testing::TestWithParam<Hostile::Kind> {
 protected:
     static void SetUpTestSuite()
     {
@@ -255,12 +250,12 @@ TEST_P(HostileDrawingTest, PrintsEveryPageOfItsGridToPostScript)
 INSTANTIATE_TEST_SUITE_P(Kinds, HostileDrawingTest,
                          ::testing::Values(Hostile::Empty, Hostile::OnePoint, Hostile::FullRange, Hostile::Corners,
                                            Hostile::Degenerate, Hostile::Crowd, Hostile::AbsurdText),
-                         [](const ::testing::TestParamInfo<Hostile::Kind>& info) {
-                             std::string name = Hostile::NameOf(info.param);
+                         [](const ::testing::TestParamInfo<Hostile::Kind>& kind) {
+                             std::string name = Hostile::NameOf(kind.param);
                              for (char& c : name)
                                  if (!std::isalnum(static_cast<unsigned char>(c)))
                                      c = '_';
                              return name;
                          });
 
-}  // namespace
+} // namespace

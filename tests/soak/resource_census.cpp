@@ -151,13 +151,13 @@ BOOL WINAPI NotedUnhook(HHOOK hook)
     return removed;
 }
 
-}  // namespace
+} // namespace
 
 bool Census::operator==(const Census& other) const
 {
     return std::tie(gdiObjects, windows, timers, hooks, deviceContexts, heapBytes) ==
-           std::tie(other.gdiObjects, other.windows, other.timers, other.hooks, other.deviceContexts,
-                    other.heapBytes);
+        std::tie(other.gdiObjects, other.windows, other.timers, other.hooks, other.deviceContexts,
+                 other.heapBytes);
 }
 
 std::ostream& operator<<(std::ostream& out, const Census& c)
@@ -355,7 +355,7 @@ BOOL CALLBACK CountTopLevel(HWND window, LPARAM count)
     return TRUE;
 }
 
-}  // namespace
+} // namespace
 
 std::vector<unsigned char> GdiHandleTable()
 {
@@ -404,7 +404,7 @@ BOOL CALLBACK NameTopLevel(HWND window, LPARAM names)
     return TRUE;
 }
 
-}  // namespace
+} // namespace
 
 std::string NameThreadWindows()
 {

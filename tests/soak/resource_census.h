@@ -20,8 +20,7 @@
 #include <string>
 #include <vector>
 
-struct Census
-{
+struct Census {
     int gdiObjects = 0;      // every live GDI object of the process
     int windows = 0;         // every window of the calling thread, children included
     int timers = 0;          // noted by the ledger and still running
@@ -34,8 +33,7 @@ struct Census
 };
 std::ostream& operator<<(std::ostream& out, const Census& census);
 
-class ResourceLedger
-{
+class ResourceLedger {
 public:
     ResourceLedger();
     ~ResourceLedger();
@@ -72,13 +70,11 @@ public:
     void NoteMadeDeviceContext(int delta) { m_madeDeviceContexts += delta; }
 
 private:
-    struct Timer
-    {
+    struct Timer {
         HWND window = nullptr;
         UINT_PTR id = 0;
     };
-    struct TakenDeviceContext
-    {
+    struct TakenDeviceContext {
         HWND window = nullptr;
         HDC dc = nullptr;
     };

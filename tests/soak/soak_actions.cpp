@@ -27,13 +27,13 @@ namespace {
 
 // How often each action is picked, in parts of the sum.
 constexpr int Weights[ActionCount] = {
-    3, 2, 4, 1,         // create, destroy, bind, unbind
-    8, 5, 4, 3, 3,      // zoom by type, to a level, to a rectangle, to a limit; undo
-    8, 5, 4, 2,         // scroll by bar, by key, by deltas; centre at the cursor
-    5, 3, 7, 4, 2, 2,   // click, double click, pan drag, rubber rectangle, drag and drop, stolen capture
-    4,                  // data tip
-    4, 3, 2, 2,         // resize, live resize, minimise, hide and show
-    5, 4, 1,            // invalidate, paint, print
+    3, 2, 4, 1,       // create, destroy, bind, unbind
+    8, 5, 4, 3, 3,    // zoom by type, to a level, to a rectangle, to a limit; undo
+    8, 5, 4, 2,       // scroll by bar, by key, by deltas; centre at the cursor
+    5, 3, 7, 4, 2, 2, // click, double click, pan drag, rubber rectangle, drag and drop, stolen capture
+    4,                // data tip
+    4, 3, 2, 2,       // resize, live resize, minimise, hide and show
+    5, 4, 1,          // invalidate, paint, print
 };
 
 // Device contexts the warm-up takes at once, to grow the system's cache of
@@ -49,8 +49,7 @@ constexpr DWORD EventGap = 40;
 // step fails): a loop that behaves ends long before.
 constexpr DWORD RubberRectangleDeadlineMs = 5000;
 
-struct Button
-{
+struct Button {
     UINT flag;
     DWORD down;
     DWORD up;
@@ -63,8 +62,7 @@ constexpr Button Buttons[] = {
 constexpr DWORD MoveOnly = 0;
 
 // Releases every button from another thread once the deadline passes.
-class LoopDeadline
-{
+class LoopDeadline {
 public:
     LoopDeadline()
     {
@@ -97,7 +95,7 @@ int Saturated(long long value)
     return static_cast<int>(std::clamp<long long>(value, INT_MIN, INT_MAX));
 }
 
-}  // namespace
+} // namespace
 
 const char* NameOf(Action action)
 {
@@ -353,7 +351,7 @@ Tavo_GrWRect Engine::WorldRect(SoakHost& host)
 void Engine::DoZoomByType(SoakHost& host)
 {
     static constexpr Tavo_GrZoom::Type types[] = {Tavo_GrZoom::ZeroLevel, Tavo_GrZoom::Out, Tavo_GrZoom::Keep,
-                                                  Tavo_GrZoom::In,        Tavo_GrZoom::In,  Tavo_GrZoom::ToLevel,
+                                                  Tavo_GrZoom::In, Tavo_GrZoom::In, Tavo_GrZoom::ToLevel,
                                                   static_cast<Tavo_GrZoom::Type>(7)};
     static constexpr Tavo_WiZoomCenter::Type centres[] = {Tavo_WiZoomCenter::AtCursor, Tavo_WiZoomCenter::AtViewCentre,
                                                           Tavo_WiZoomCenter::AtPoint,
@@ -803,4 +801,4 @@ void Engine::Trace(const char* format, ...)
     std::fflush(stdout);
 }
 
-}  // namespace Soak
+} // namespace Soak

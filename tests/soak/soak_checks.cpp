@@ -45,7 +45,7 @@ bool SpansView(int low, int high, double length)
     return std::fabs(side - length) <= slack;
 }
 
-}  // namespace
+} // namespace
 
 std::string DescribeView(SoakHost& host)
 {
@@ -59,7 +59,7 @@ std::string DescribeView(SoakHost& host)
         text += Format(", mapping %d x %d, scale %g, level %g (%d), drawing ", mapping->GetDeviceWindowWidth(),
                        mapping->GetDeviceWindowHeight(), mapping->GetTransform().GetScale(),
                        mapping->GetRealZoomLevel(), mapping->GetZoomLevel()) +
-                Describe(wnd.GetDrawing()->GetBounds());
+            Describe(wnd.GetDrawing()->GetBounds());
     return text;
 }
 
@@ -137,8 +137,7 @@ std::string CheckView(SoakHost& host)
     const double viewWidth = client.Width() / scale;
     const double viewHeight = client.Height() / scale;
     if (!SpansView(clip.x1, clip.x2, viewWidth) || !SpansView(clip.y1, clip.y2, viewHeight))
-        return "world clip box " + Describe(clip) + Format(" for %d x %d pixels at scale %g", client.Width(),
-                                                            client.Height(), scale);
+        return "world clip box " + Describe(clip) + Format(" for %d x %d pixels at scale %g", client.Width(), client.Height(), scale);
     // The scroll model's extent is the view's size, as far as an int holds it.
     const CSize extent = wnd.GetWindowExtent();
     if (std::fabs(extent.cx - std::min(viewWidth, double(INT_MAX))) > 1.0 + 1e-9 * viewWidth ||
@@ -157,13 +156,14 @@ std::string CheckView(SoakHost& host)
     // unit for the rounding of the corner.
     if (level > 0.0) {
         const Tavo_GrTransform& t = mapping->GetTransform();
-        const auto nearPosition = [scale](int corner, long long position, double error) {
+        const auto nearPosition = [scale](int corner, long long scrolled, double error) {
             const double allowed = (std::fabs(error) + 1.0) / scale + 1.0;
-            return std::fabs(static_cast<double>(corner) - Tavo_GrRound(static_cast<double>(position))) <= allowed;
+            return std::fabs(static_cast<double>(corner) - static_cast<double>(scrolled)) <= allowed;
         };
         if (!nearPosition(clip.x1, position.x, t.GetXError()) || !nearPosition(clip.y2, position.y, t.GetYError()))
             return Format("scroll position (%ld, %ld) with error terms (%g, %g) but the view's top-left corner is "
-                          "(%d, %d)", position.x, position.y, t.GetXError(), t.GetYError(), clip.x1, clip.y2);
+                          "(%d, %d)",
+                          position.x, position.y, t.GetXError(), t.GetYError(), clip.x1, clip.y2);
     }
     return "";
 }
@@ -259,4 +259,4 @@ std::uint64_t Engine::Digest(std::uint64_t digest, Action action) const
     return digest;
 }
 
-}  // namespace Soak
+} // namespace Soak

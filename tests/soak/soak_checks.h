@@ -21,4 +21,4 @@ std::string CheckView(SoakHost& host);
 // drawing's bounds, for a report.
 std::string DescribeView(SoakHost& host);
 
-}  // namespace Soak
+} // namespace Soak

@@ -16,8 +16,7 @@
 
 namespace Soak {
 
-class Engine
-{
+class Engine {
 public:
     // At most this many windows live at once.
     static constexpr size_t MaxWindows = 3;
@@ -112,18 +111,18 @@ private:
 
     const Options& m_options;
     SoakRandom m_random;
-    CWinApp m_app{"soak"};                               // its printer defaults are the printer's
+    CWinApp m_app{"soak"}; // its printer defaults are the printer's
     ResourceLedger m_ledger;
     std::vector<std::unique_ptr<Tavo_GrDrawing>> m_drawings;
-    std::vector<std::unique_ptr<SoakHost>> m_hosts;      // capacity MaxWindows, reserved
+    std::vector<std::unique_ptr<SoakHost>> m_hosts; // capacity MaxWindows, reserved
     std::string m_printPath;
-    DWORD m_time = 0;                                    // the message time of the last input
+    DWORD m_time = 0; // the message time of the last input
     Census m_baseline;
-    std::vector<unsigned char> m_baselineGdiTable;      // what lived in each entry at the baseline
+    std::vector<unsigned char> m_baselineGdiTable; // what lived in each entry at the baseline
     int m_idleCensuses = 0;
     bool m_warmingUp = false;
     Events m_events;
-    std::string m_stepFault;                             // what an action saw go wrong, for the step's check
+    std::string m_stepFault; // what an action saw go wrong, for the step's check
 };
 
-}  // namespace Soak
+} // namespace Soak

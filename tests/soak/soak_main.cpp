@@ -20,7 +20,7 @@ void Usage()
     std::fprintf(stderr, "usage: soak [--steps N] [--seed S] [--trace] [--print-to PATH]\n");
 }
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv)
 {

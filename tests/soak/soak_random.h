@@ -7,8 +7,7 @@
 #include <cstddef>
 #include <cstdint>
 
-class SoakRandom
-{
+class SoakRandom {
 public:
     explicit SoakRandom(std::uint64_t seed) : m_state(seed) {}
 

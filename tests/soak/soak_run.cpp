@@ -15,7 +15,7 @@ double Seconds(const LARGE_INTEGER& from, const LARGE_INTEGER& to)
     return static_cast<double>(to.QuadPart - from.QuadPart) / static_cast<double>(frequency.QuadPart);
 }
 
-}  // namespace
+} // namespace
 
 Result Run(const Options& options)
 {
@@ -84,4 +84,4 @@ std::string Describe(const Result& result)
     return text.str();
 }
 
-}  // namespace Soak
+} // namespace Soak

@@ -25,8 +25,7 @@
 
 namespace Soak {
 
-enum Action
-{
+enum Action {
     CreateWindow,
     DestroyWindow,
     Bind,
@@ -58,11 +57,10 @@ enum Action
 };
 const char* NameOf(Action action);
 
-struct Options
-{
+struct Options {
     std::uint64_t seed = 1;
     long long steps = 1000;
-    bool trace = false;                 // print every step as it runs
+    bool trace = false; // print every step as it runs
     // Where print jobs go (a Windows path; Z:\ reaches the Unix side);
     // empty: a file in the temporary folder.
     std::string printPath;
@@ -71,8 +69,7 @@ struct Options
 };
 
 // What the windows told the application and what they did, over a run.
-struct Events
-{
+struct Events {
     long long paints = 0;
     long long clicks = 0;
     long long doubleClicks = 0;
@@ -82,21 +79,20 @@ struct Events
     long long pagesPrinted = 0;
 };
 
-struct Result
-{
+struct Result {
     std::uint64_t seed = 0;
     long long stepsRun = 0;
-    long long failedStep = -1;          // the step whose checks failed; -1: none did
+    long long failedStep = -1; // the step whose checks failed; -1: none did
     std::string failedAction;
     std::string violation;
-    Census before;                      // after the warm-up, before the first step
-    Census after;                       // after the last step, every window destroyed
-    double seconds = 0.0;               // the steps alone
-    std::uint64_t digest = 0;           // of the view after every step
+    Census before;            // after the warm-up, before the first step
+    Census after;             // after the last step, every window destroyed
+    double seconds = 0.0;     // the steps alone
+    std::uint64_t digest = 0; // of the view after every step
     std::array<long long, ActionCount> actions = {};
     Events events;
-    int idleCensuses = 0;               // times no window was left and the census was compared
-    std::string newGdiObjects;          // at the end, when more live than at the start
+    int idleCensuses = 0;      // times no window was left and the census was compared
+    std::string newGdiObjects; // at the end, when more live than at the start
 
     bool IsClean() const { return failedStep < 0 && before == after; }
 };
@@ -106,4 +102,4 @@ Result Run(const Options& options);
 // "seed S, step N (action): violation" or a line of figures for a clean run.
 std::string Describe(const Result& result);
 
-}  // namespace Soak
+} // namespace Soak

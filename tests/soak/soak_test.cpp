@@ -73,11 +73,11 @@ TEST(Soak, CensusCountsWhatIsLeftBehind)
     const HWND window = ::CreateWindowExA(0, "STATIC", "", WS_POPUP, 0, 0, 10, 10, nullptr, nullptr, nullptr, nullptr);
     EXPECT_EQ(settled().windows, with.windows + 1);
     ::DestroyWindow(window);
-    host->Wnd().SetTimer(77, 1000, nullptr);         // through the framework, as the drawing window does
+    host->Wnd().SetTimer(77, 1000, nullptr); // through the framework, as the drawing window does
     EXPECT_EQ(settled().timers, with.timers + 1);
     host->Wnd().KillTimer(77);
     {
-        const CClientDC dc(&host->Wnd());                // through the framework
+        const CClientDC dc(&host->Wnd()); // through the framework
         EXPECT_EQ(settled().deviceContexts, with.deviceContexts + 1);
     }
     const long long heap = CountHeapBytes();
@@ -90,4 +90,4 @@ TEST(Soak, CensusCountsWhatIsLeftBehind)
     EXPECT_EQ(settled(), before);
 }
 
-}  // namespace
+} // namespace

@@ -45,4 +45,4 @@ inline COLORREF Colour(char index)
 // The scrollee's background, where nothing is drawn.
 constexpr COLORREF Background = RGB(0, 0, 0);
 
-}  // namespace SoakTest
+} // namespace SoakTest

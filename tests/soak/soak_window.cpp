@@ -24,12 +24,11 @@ const char* HostClass()
 
 // The core is initialised once for the whole program, as an application
 // does at start.
-struct LibraryInitialisation
-{
+struct LibraryInitialisation {
     LibraryInitialisation() { Tavo_WiLibrary::Initialize(); }
 };
 
-}  // namespace
+} // namespace
 
 // ---- the drawing window ------------------------------------------------------------
 
@@ -106,17 +105,20 @@ void SoakHost::ScrollByKey(WPARAM key)
 {
     if (!IsAlive())
         return;
-    struct Binding
-    {
+    struct Binding {
         WPARAM key;
         Tavo_WiScroll::Dir dir;
         Tavo_WiScroll::Amount amount;
     };
     static constexpr Binding bindings[] = {
-        {VK_LEFT, Tavo_WiScroll::Left, Tavo_WiScroll::Line},   {VK_RIGHT, Tavo_WiScroll::Right, Tavo_WiScroll::Line},
-        {VK_UP, Tavo_WiScroll::Up, Tavo_WiScroll::Line},       {VK_DOWN, Tavo_WiScroll::Down, Tavo_WiScroll::Line},
-        {VK_PRIOR, Tavo_WiScroll::Up, Tavo_WiScroll::Page},    {VK_NEXT, Tavo_WiScroll::Down, Tavo_WiScroll::Page},
-        {VK_HOME, Tavo_WiScroll::Left, Tavo_WiScroll::Limit},  {VK_END, Tavo_WiScroll::Right, Tavo_WiScroll::Limit},
+        {VK_LEFT, Tavo_WiScroll::Left, Tavo_WiScroll::Line},
+        {VK_RIGHT, Tavo_WiScroll::Right, Tavo_WiScroll::Line},
+        {VK_UP, Tavo_WiScroll::Up, Tavo_WiScroll::Line},
+        {VK_DOWN, Tavo_WiScroll::Down, Tavo_WiScroll::Line},
+        {VK_PRIOR, Tavo_WiScroll::Up, Tavo_WiScroll::Page},
+        {VK_NEXT, Tavo_WiScroll::Down, Tavo_WiScroll::Page},
+        {VK_HOME, Tavo_WiScroll::Left, Tavo_WiScroll::Limit},
+        {VK_END, Tavo_WiScroll::Right, Tavo_WiScroll::Limit},
     };
     for (const Binding& binding : bindings)
         if (binding.key == key)

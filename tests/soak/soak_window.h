@@ -20,17 +20,15 @@
 
 #include <functional>
 
-class SoakDrawWnd : public Tavo_WiDrawWnd
-{
+class SoakDrawWnd : public Tavo_WiDrawWnd {
 public:
-    struct Counts
-    {
+    struct Counts {
         int clicks = 0;
         int doubleClicks = 0;
         int rubberRectangles = 0;
         int dragAndDrops = 0;
         int dataTipQuestions = 0;
-        int paints = 0;     // passes of the paint path that reached the drawing
+        int paints = 0; // passes of the paint path that reached the drawing
     };
 
     Counts counts;
@@ -50,9 +48,9 @@ protected:
     using Tavo_WiDrawWnd::OnDraw;
     void OnDraw(Tavo_WiScrollee* scrollee, CDC* dc, Tavo_GrDrawing* drawing, Tavo_WiNativeWindowSurface* surface,
                 Tavo_GrMapping* mapping, Tavo_GrDRect& rect) override;
+    using Tavo_WiDrawWnd::GetDataTipText;
     using Tavo_WiDrawWnd::OnClick;
     using Tavo_WiDrawWnd::OnDoubleClick;
-    using Tavo_WiDrawWnd::GetDataTipText;
     void OnClick(UINT, UINT, const Tavo_GrWRect&) override { ++counts.clicks; }
     void OnDoubleClick(UINT, UINT, const Tavo_GrWRect&) override { ++counts.doubleClicks; }
     DragAction GetDragAction(UINT, UINT, const CPoint&) override { return dragAction; }
@@ -65,8 +63,7 @@ private:
     Tavo_WiWin32Surface m_printSurface;
 };
 
-class SoakHost
-{
+class SoakHost {
 public:
     // A shown, activated top-level window at a screen rectangle.
     explicit SoakHost(const CRect& screenRect);
@@ -93,6 +90,6 @@ private:
     void ScrollByKey(WPARAM key);
 
     HWND m_hwnd = nullptr;
-    CWnd m_wnd;     // the framework's view of the host, as the drawing window's parent
+    CWnd m_wnd; // the framework's view of the host, as the drawing window's parent
     SoakDrawWnd m_drawWnd;
 };

@@ -101,15 +101,25 @@ COLORREF WINAPI RecordSetTextColor(HDC dc, COLORREF colour)
     return Forward<decltype(&SetTextColor)>(GdiCall::SetTextColor)(dc, colour);
 }
 
-#define TAVO_RECORD(function) {#function, reinterpret_cast<void*>(&Record##function)}
+#define TAVO_RECORD(function)                                   \
+    {                                                           \
+#function, reinterpret_cast < void*>(&Record##function) \
+    }
 
 // In the order of GdiCall::Kind.
 const std::pair<const char*, void*> kReplacements[] = {
-    TAVO_RECORD(PolyPolyline), TAVO_RECORD(Polygon),
+    TAVO_RECORD(PolyPolyline),
+    TAVO_RECORD(Polygon),
     {"Rectangle", reinterpret_cast<void*>(&RecordBox<GdiCall::Rectangle>)},
     {"Ellipse", reinterpret_cast<void*>(&RecordBox<GdiCall::Ellipse>)},
-    TAVO_RECORD(TextOutA), TAVO_RECORD(SelectObject), TAVO_RECORD(CreatePen), TAVO_RECORD(CreateBrushIndirect),
-    TAVO_RECORD(CreateFontIndirectA), TAVO_RECORD(DeleteObject), TAVO_RECORD(SetTextAlign), TAVO_RECORD(SetTextColor),
+    TAVO_RECORD(TextOutA),
+    TAVO_RECORD(SelectObject),
+    TAVO_RECORD(CreatePen),
+    TAVO_RECORD(CreateBrushIndirect),
+    TAVO_RECORD(CreateFontIndirectA),
+    TAVO_RECORD(DeleteObject),
+    TAVO_RECORD(SetTextAlign),
+    TAVO_RECORD(SetTextColor),
 };
 
 #undef TAVO_RECORD

@@ -14,8 +14,18 @@
 
 struct GdiCall {
     enum Kind {
-        PolyPolyline, Polygon, Rectangle, Ellipse, TextOut, SelectObject,
-        CreatePen, CreateBrush, CreateFont, DeleteObject, SetTextAlign, SetTextColor,
+        PolyPolyline,
+        Polygon,
+        Rectangle,
+        Ellipse,
+        TextOut,
+        SelectObject,
+        CreatePen,
+        CreateBrush,
+        CreateFont,
+        DeleteObject,
+        SetTextAlign,
+        SetTextColor,
     };
     bool IsCreation() const { return kind >= CreatePen && kind <= CreateFont; }
 

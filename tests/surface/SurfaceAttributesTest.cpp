@@ -97,8 +97,13 @@ TEST_F(SurfaceTest, FontHeightIsScaledRoundedAndKeptAtTheMinimum)
         int charHeight;
         std::vector<int> fonts; // the heights of the fonts made; none: the text becomes a placeholder
     } cases[] = {
-        {nullptr, 1.0, 5, {8}},     {"12", 1.0, 5, {12}},     {"2", 1.0, 3, {3}},       {"2", 1.0, 2, {}},
-        {nullptr, 0.5, 21, {11}},   {nullptr, 1.0, -40, {}},  {nullptr, 1.0e12, 1000, {}},   // too tall: placeholder
+        {nullptr, 1.0, 5, {8}},
+        {"12", 1.0, 5, {12}},
+        {"2", 1.0, 3, {3}},
+        {"2", 1.0, 2, {}},
+        {nullptr, 0.5, 21, {11}},
+        {nullptr, 1.0, -40, {}},
+        {nullptr, 1.0e12, 1000, {}}, // taller than twice the device: a placeholder
     };
     for (const auto& c : cases) {
         SCOPED_TRACE(testing::Message() << "minimum " << (c.minFont ? c.minFont : "unset") << ", " << c.charHeight);

@@ -20,7 +20,11 @@
 // The tests call the surface's DrawText, never the Win32 macro of that name.
 #undef DrawText
 
-enum TestColour : char { kBlack = 0, kBlue = 1, kRed = 4 };
+enum TestColour : char {
+    kBlack = 0,
+    kBlue = 1,
+    kRed = 4
+};
 
 inline Tavo_GrAttr Outline(char colour, int charHeight = 0, char align = Tavo_GrAttr::AlignDefault)
 {

@@ -14,11 +14,15 @@ static std::vector<HGDIOBJ> CurrentObjects(HDC dc)
 TEST_F(SurfaceTest, APassEndedOrCutShortLeavesTheDcAsItWasAndDeletesWhatItMade)
 {
     const std::vector<HGDIOBJ> before = CurrentObjects(m_canvas.GetDC());
-    enum class Ending { EndDrawing, Destroyed, Rebound };
+    enum class Ending {
+        EndDrawing,
+        Destroyed,
+        Rebound
+    };
     for (const Ending ending : {Ending::EndDrawing, Ending::Destroyed, Ending::Rebound}) {
-        SCOPED_TRACE(ending == Ending::EndDrawing ? "EndDrawing"
-                     : ending == Ending::Destroyed ? "surface destroyed in the middle of a pass"
-                                                   : "surface bound to another DC in the middle of a pass");
+        SCOPED_TRACE(ending == Ending::EndDrawing      ? "EndDrawing"
+                         : ending == Ending::Destroyed ? "surface destroyed in the middle of a pass"
+                                                       : "surface bound to another DC in the middle of a pass");
         CreateSurface();
         Tavo_GrAttr attr = Filled(kRed, 20);
         Tavo_GrDRect r{10, 10, 50, 50};

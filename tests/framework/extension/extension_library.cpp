@@ -9,14 +9,14 @@ namespace {
 AFX_EXTENSION_MODULE g_extensionModule = {};
 BOOL g_attached = FALSE;
 
-}  // namespace
+} // namespace
 
 extern "C" BOOL WINAPI DllMain(HINSTANCE hInstance, DWORD dwReason, LPVOID)
 {
     if (dwReason == DLL_PROCESS_ATTACH && !g_attached) {
         g_attached = TRUE;
         AfxInitExtensionModule(g_extensionModule, hInstance);
-        new CDynLinkLibrary(g_extensionModule);  // owned by the framework's chain
+        new CDynLinkLibrary(g_extensionModule); // owned by the framework's chain
     }
     return TRUE;
 }
