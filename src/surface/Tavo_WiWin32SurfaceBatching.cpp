@@ -29,20 +29,6 @@ void SetBox(RECT& box, int left, int top, int right, int bottom)
     box.bottom = bottom;
 }
 
-// Whether a box equals the one added last to its batch. Drawing it again
-// would draw the same pixels (nothing of its kind is emitted between the
-// two, and the attribute is the same for the whole batch), so it is left
-// out: a crowd of items on one spot then costs one GDI call instead of a
-// fill of the whole box for each, as repeated dots do.
-template <class Batch>
-bool RepeatsLastBox(const Batch& batch, int left, int top, int right, int bottom)
-{
-    if (batch.IsEmpty())
-        return false;
-    const RECT& last = *batch.GetElement(batch.m_count - 1);
-    return last.left == left && last.top == top && last.right == right && last.bottom == bottom;
-}
-
 } // namespace
 
 // ---- Point-count arrays -----------------------------------------------------
@@ -130,12 +116,6 @@ void Tavo_WiWin32Surface::AddFilledTriangle(int x0, int y0, int x1, int y1, int 
 
 void Tavo_WiWin32Surface::AddHollowRect(int l, int t, int r, int b)
 {
-    // A repeat of the last outline draws the same pixels (see RepeatsLastBox).
-    if (!m_hollowRects.IsEmpty()) {
-        const POINT* last = m_hollowRects.GetElement(m_hollowRects.m_count - 1);
-        if (last[0].x == l && last[0].y == t && last[2].x == r && last[2].y == b)
-            return;
-    }
     POINT* element = m_hollowRects.Append();
     SetPoint(element[0], l, t);
     SetPoint(element[1], r, t);
@@ -150,8 +130,6 @@ void Tavo_WiWin32Surface::AddHollowRect(int l, int t, int r, int b)
 // edge beyond 32767 pixels (common in a zoomed-in view) to the other side.
 void Tavo_WiWin32Surface::AddFilledRect(int l, int t, int r, int b)
 {
-    if (RepeatsLastBox(m_filledRects, l, t, r, b))
-        return;
     SetBox(*m_filledRects.Append(), l, t, r, b);
     if (m_filledRects.IsFull())
         FlushFilledRects();
@@ -159,22 +137,16 @@ void Tavo_WiWin32Surface::AddFilledRect(int l, int t, int r, int b)
 
 void Tavo_WiWin32Surface::AddHollowCircle(int x, int y, int radius)
 {
-    const int l = Tavo_GrSubtract(x, radius), t = Tavo_GrSubtract(y, radius);
-    const int r = Tavo_GrAdd(x, radius), b = Tavo_GrAdd(y, radius);
-    if (RepeatsLastBox(m_hollowCircles, l, t, r, b))
-        return;
-    SetBox(*m_hollowCircles.Append(), l, t, r, b);
+    SetBox(*m_hollowCircles.Append(), Tavo_GrSubtract(x, radius), Tavo_GrSubtract(y, radius), Tavo_GrAdd(x, radius),
+           Tavo_GrAdd(y, radius));
     if (m_hollowCircles.IsFull())
         FlushHollowCircles();
 }
 
 void Tavo_WiWin32Surface::AddFilledCircle(int x, int y, int radius)
 {
-    const int l = Tavo_GrSubtract(x, radius), t = Tavo_GrSubtract(y, radius);
-    const int r = Tavo_GrAdd(x, radius), b = Tavo_GrAdd(y, radius);
-    if (RepeatsLastBox(m_filledCircles, l, t, r, b))
-        return;
-    SetBox(*m_filledCircles.Append(), l, t, r, b);
+    SetBox(*m_filledCircles.Append(), Tavo_GrSubtract(x, radius), Tavo_GrSubtract(y, radius), Tavo_GrAdd(x, radius),
+           Tavo_GrAdd(y, radius));
     if (m_filledCircles.IsFull())
         FlushFilledCircles();
 }

@@ -254,10 +254,11 @@ TEST_F(FaultTest, WindowDestroyedFromInsideARubberRectangleEndsItAtOnce)
 
 TEST_F(FaultTest, EscapeHeldDuringAPaintStopsThePassAndTheNextPaintIsWhole)
 {
-    // A crowd of red rectangles on one spot, filling the view.
-    auto crowd = Hostile::Build(Hostile::Crowd, 20000);
+    // Red rectangles stacked on one box, filling the view.
+    const Tavo_GrWRect box{100, 100, 200, 200};
+    auto crowd = Hostile::BuildStack(box, 20000);
     wnd().SetDrawingInfo(crowd.get(), 50, 3, 0, 0, 0);
-    wnd().ZoomWindow(Hostile::CrowdSpot);
+    wnd().ZoomWindow(box);
     Settle(*host);
     const int whole = wnd().counts.paints;
     ASSERT_EQ(Capture(*host)->GetPixel(250, 200), Colour(Hostile::Red));

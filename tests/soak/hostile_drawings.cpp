@@ -52,7 +52,40 @@ void BuildAbsurdText(Tavo_GrDrawingBuilder& build)
     build.AddText(-500, 0, std::string(100000, 'W').c_str());
 }
 
+// Items of every kind, all on one point: a dot, a line, a polyline and a
+// polygon of no length, rectangles of no size, circles of no radius, a
+// triangle of one point, in turn filled and hollow.
+void BuildCrowd(Tavo_GrDrawingBuilder& build, int count)
+{
+    build.Reserve(count, 3 * count);
+    const Tavo_GrWPoint p = CrowdPoint;
+    const Tavo_GrWPoint same[] = {p, p, p};
+    for (int i = 0; i < count; ++i) {
+        if (i % 2 == 0)
+            build.SetAttr(Tavo_GrAttr(Red, (i / 2) % 2 == 0 ? Solid : Hollow));
+        switch ((i / 4) % 6) {
+        case 0: build.AddDot(p.x, p.y); break;
+        case 1: build.AddLine(p.x, p.y, p.x, p.y); break;
+        case 2: build.AddRect(p.x, p.y, p.x, p.y); break;
+        case 3: build.AddCircle(p.x, p.y, 0); break;
+        case 4: build.AddTriangle(p, p, p); break;
+        default: i % 2 == 0 ? build.AddPolyline(3, same) : build.AddPolygon(3, same); break;
+        }
+    }
+}
+
 } // namespace
+
+std::unique_ptr<Tavo_GrDrawing> BuildStack(const Tavo_GrWRect& box, int count)
+{
+    auto drawing = std::make_unique<Tavo_GrDrawing>();
+    Tavo_GrDrawingBuilder build(*drawing);
+    build.Reserve(count, 2 * count);
+    build.SetAttr(Tavo_GrAttr(Red, Solid));
+    for (int i = 0; i < count; ++i)
+        build.AddRect(box.x1, box.y1, box.x2, box.y2);
+    return drawing;
+}
 
 const char* NameOf(Kind kind)
 {
@@ -93,10 +126,7 @@ std::unique_ptr<Tavo_GrDrawing> Build(Kind kind, int crowd)
         BuildDegenerate(build);
         break;
     case Crowd:
-        build.Reserve(crowd, 2 * crowd);
-        build.SetAttr(Tavo_GrAttr(Red, Solid));
-        for (int i = 0; i < crowd; ++i)
-            build.AddRect(CrowdSpot.x1, CrowdSpot.y1, CrowdSpot.x2, CrowdSpot.y2);
+        BuildCrowd(build, crowd);
         break;
     case AbsurdText:
         BuildAbsurdText(build);

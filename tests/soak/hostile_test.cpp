@@ -67,8 +67,11 @@ const Picture ZeroLevelPictures[] = {
          const int blue = CountAll(c, Colour(Hostile::Blue));
          return blue > 0 && blue <= 8 && Count(c, Colour(Hostile::Red), SquareOfTheZeroLevel) + blue >= SquareOfTheZeroLevel.Width() * SquareOfTheZeroLevel.Height();
      }},
-    {Hostile::Crowd, "the red square of one of its rectangles",
-     [](const DibCanvas& c) { return SquareOnly(c, Colour(Hostile::Red)); }},
+    {Hostile::Crowd, "a red square of 2 x 2 pixels in the middle, and nothing else: every item on the point is that small",
+     [](const DibCanvas& c) {
+         return CountAll(c, Colour(Hostile::Red)) == 4 &&
+             Count(c, Colour(Hostile::Red), CRect(Width / 2, Height / 2, Width / 2 + 2, Height / 2 + 2)) == 4;
+     }},
     {Hostile::AbsurdText, "white and red text, each character of it smaller than the window",
      [](const DibCanvas& c) {
          return CountAll(c, Colour(Hostile::White)) > 1000 && CountAll(c, Colour(Hostile::Red)) > 1000;
@@ -87,7 +90,7 @@ const ZoomedPicture ZoomedPictures[] = {
     {Hostile::FullRange, {INT_MAX - 10, INT_MIN, INT_MAX, INT_MIN + 10}, Hostile::Red},
     {Hostile::Corners, Hostile::HighCorner, Hostile::Red},
     {Hostile::Corners, Hostile::LowInside, Hostile::Blue},
-    {Hostile::Crowd, {150, 150, 151, 151}, Hostile::Red},
+    {Hostile::Crowd, {Hostile::CrowdPoint.x - 1, Hostile::CrowdPoint.y - 1, Hostile::CrowdPoint.x + 1, Hostile::CrowdPoint.y + 1}, Hostile::Red},
     {Hostile::OnePoint, {Hostile::Point.x - 1, Hostile::Point.y - 1, Hostile::Point.x + 1, Hostile::Point.y + 1}, Hostile::White},
 };
 

@@ -13,7 +13,6 @@
 #include <afxext.h>
 
 #include <atomic>
-#include <cmath>
 #include <cstdarg>
 #include <cstdio>
 #include <fstream>
@@ -492,6 +491,7 @@ void Engine::DoDrag(SoakHost& host, Tavo_WiDrawWnd::DragAction action, bool stea
     wnd.dragAction = m_random.Chance(5) ? static_cast<Tavo_WiDrawWnd::DragAction>(7) : action;
     const Button& button = m_random.Pick(Buttons);
     Trace(" action %d button %u from (%ld, %ld)", wnd.dragAction, button.flag, at.x, at.y);
+    Mouse(button.down, at, InteractionGap);
 
     // The press has been held long enough: the drag starts.
     if (m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId)) {
@@ -699,16 +699,17 @@ void Engine::DoPrint(SoakHost& host)
     if (m_random.Chance(50))
         choice.Flags &= ~static_cast<DWORD>(PD_SELECTION);
     CDC printer;
-    if (!m_app.CreatePrinterDC(printer))
-        return;
-    wnd.OnBeginPrinting(&printer, &info);
     DOCINFOA document = {sizeof document, "soak", m_printPath.c_str(), nullptr, 0};
-    if (printer.StartDoc(&document) <= 0)
+    if (!m_app.CreatePrinterDC(printer) || printer.StartDoc(&document) <= 0) {
+        m_stepFault = "the default printer took no print job";
         return;
+    }
+    wnd.OnBeginPrinting(&printer, &info);
     const UINT pages = choice.nMaxPage;
     const UINT candidates[] = {0u, 1u, static_cast<UINT>(wnd.GetPrintLayout().m_currentPage), pages, pages + 1,
                                static_cast<UINT>(m_random.Between(1, std::max<int>(pages, 1))), UINT_MAX};
-    for (int i = m_random.Between(1, 3); i > 0; --i) {
+    const int sheets = m_random.Between(1, 3);
+    for (int i = 0; i < sheets; ++i) {
         info.m_nCurPage = m_random.Pick(candidates);
         Trace(" page %u of %u", info.m_nCurPage, pages);
         printer.StartPage();
@@ -719,6 +720,27 @@ void Engine::DoPrint(SoakHost& host)
     }
     printer.EndDoc();
     wnd.OnEndPrinting(&printer, &info);
+    // Every sheet started is in the job, if only blank.
+    if (CountPostScriptPages(m_printPath) != sheets)
+        m_stepFault = "the print job is not PostScript with a page for each sheet";
+}
+
+int Engine::CountPostScriptPages(const std::string& path)
+{
+    std::ifstream file(path, std::ios::binary);
+    std::string job((std::istreambuf_iterator<char>(file)), std::istreambuf_iterator<char>());
+    if (job.rfind("%!PS", 0) != 0)
+        return -1;
+    // The driver writes over the file without truncating it: whatever
+    // follows the job's end is left from a longer job before.
+    const size_t end = job.find("\n%%EOF");
+    if (end == std::string::npos)
+        return -1;
+    job.resize(end);
+    int pages = 0;
+    for (size_t at = job.find("\n%%Page:"); at != std::string::npos; at = job.find("\n%%Page:", at + 1))
+        ++pages;
+    return pages;
 }
 
 // ---- input and time ----------------------------------------------------------------------------

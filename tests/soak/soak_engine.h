@@ -77,6 +77,8 @@ private:
     void DoInvalidate(SoakHost& host);
     void DoPaint(SoakHost& host);
     void DoPrint(SoakHost& host);
+    // The pages of a PostScript job; -1 when the file holds none.
+    static int CountPostScriptPages(const std::string& path);
 
     // ---- input and time ------------------------------------------------------------------
     // A mouse event at a screen point, dt milliseconds after the last one.
