@@ -5,7 +5,6 @@
 #include "ViewerSettings.h"
 
 #include "Tavo_GrRound.h"
-#include "Tavo_WiParkedCursorMonitor.h"
 
 #include <cstdlib>
 
@@ -91,21 +90,6 @@ void DrawingView::OnDoubleClick(UINT button, UINT, const Tavo_GrWRect&)
 Tavo_WiDrawWnd::DragAction DrawingView::GetDragAction(UINT, UINT flags, const CPoint&)
 {
     return (flags & MK_SHIFT) != 0 ? RubberRectangle : Pan;
-}
-
-void DrawingView::DoRubberRectangle(UINT button, UINT flags, const CPoint& start)
-{
-    Tavo_WiDrawWnd::DoRubberRectangle(button, flags, start);
-    // The rectangle's own message loop takes the button's release, so the
-    // parked cursor monitor, which saw the press, would wait for a release
-    // and show no data tip until the next click. It is shown the release.
-    const UINT release = button == MK_RBUTTON ? WM_RBUTTONUP : button == MK_MBUTTON ? WM_MBUTTONUP
-                                                                                    : WM_LBUTTONUP;
-    MSG message = {};
-    message.hwnd = GetScrollee()->GetSafeHwnd();
-    message.message = release;
-    if (Tavo_WiParkedCursorMonitor* monitor = GetScrollee()->GetParkedCursorMonitor())
-        monitor->RelayEvent(&message);
 }
 
 void DrawingView::OnRubberRectangle(UINT, UINT, const Tavo_GrWRect& rect)

@@ -59,9 +59,6 @@ protected:
     void OnClick(UINT button, UINT flags, const Tavo_GrWRect& aperture) override;
     void OnDoubleClick(UINT button, UINT flags, const Tavo_GrWRect& aperture) override;
     DragAction GetDragAction(UINT button, UINT flags, const CPoint& point) override;
-    // The window's rubber rectangle, then the parked cursor monitor is told
-    // that the button is up again (see the source).
-    void DoRubberRectangle(UINT button, UINT flags, const CPoint& start) override;
     void OnRubberRectangle(UINT button, UINT flags, const Tavo_GrWRect& rect) override;
     CString GetDataTipText(const Tavo_GrWRect& aperture) override;
 

@@ -3,6 +3,7 @@
 // autoscroll once the pointer leaves it), run a rubber rectangle, or are
 // handed to the application as drag and drop.
 #include "Tavo_WiDrawWnd.h"
+#include "Tavo_WiParkedCursorMonitor.h"
 
 #include "Tavo_WiResourceIds.h"
 #include "Tavo_WiViewMath.h"
@@ -260,6 +261,12 @@ void Tavo_WiDrawWnd::DoRubberRectangle(UINT button, UINT flags, const CPoint& st
                 break;
             dc.DrawFocusRect(&rect);
         } else if (msg.message == endMessage) {
+            // The scrollee's parked cursor monitor saw the press and would
+            // wait for this release, showing no data tip until the next
+            // click: it is shown the release the loop takes.
+            if (::IsWindow(view))
+                if (Tavo_WiParkedCursorMonitor* monitor = scrollee->GetParkedCursorMonitor())
+                    monitor->RelayEvent(&msg);
             completed = true;
             break;
         } else if (msg.message == WM_MOUSEMOVE) {

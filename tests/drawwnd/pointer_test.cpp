@@ -4,6 +4,7 @@
 #include "drawwnd_test_support.h"
 
 #include "Tavo_WiModule.h"
+#include "Tavo_WiParkedCursorMonitor.h"
 #include "Tavo_WiResourceIds.h"
 #include "Tavo_WiScrollee.h"
 #include "Tavo_WiViewMath.h"
@@ -553,6 +554,20 @@ TEST_F(DrawWndPointerBoundTest, RubberRectangleWithoutMovementIsReportedWithZero
     FireHoldTimerIntoRubberRectangle();
     ASSERT_EQ(NoteNames(), Names{"RubberRectangle"});
     EXPECT_EQ(wnd().notes[0].rect, (Tavo_GrWRect{120, 270, 120, 270}));
+}
+
+TEST_F(DrawWndPointerBoundTest, RubberRectangleShowsTheReleaseItTakesToTheParkedCursorMonitor)
+{
+    // The monitor saw the press. Had it not seen the release, which the
+    // rectangle's loop takes, it would start no wait for a rest, and show no
+    // data tip, until the next click.
+    const HWND monitor = wnd().GetScrollee()->GetParkedCursorMonitor()->GetSafeHwnd();
+    Input(MOUSEEVENTF_LEFTDOWN, CPoint(120, 130), 1000);
+    Queue(MOUSEEVENTF_LEFTUP, CPoint(160, 170), 1400);
+    FireHoldTimerIntoRubberRectangle();
+    ASSERT_EQ(NoteNames(), Names{"RubberRectangle"});
+    Input(MoveOnly, CPoint(180, 190), 1500);
+    EXPECT_TRUE(::KillTimer(monitor, Tavo_WiParkedCursorMonitor::ParkTimerId)) << "the move starts the wait for a rest";
 }
 
 TEST_F(DrawWndPointerBoundTest, PaintTakenByTheRubberRectangleIsDispatchedUnderTheOutline)
