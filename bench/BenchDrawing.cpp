@@ -3,6 +3,8 @@
 #include "Tavo_GrDrawing.h"
 #include "Tavo_GrDrawingBuilder.h"
 
+#include <cstring>
+
 namespace {
 
 // A small linear congruential generator: the same drawing on every run.
@@ -47,7 +49,16 @@ BenchPrimitive::Kind PickKind(Random& random)
 
 } // namespace
 
-std::vector<BenchPrimitive> GeneratePrimitives(int count)
+int BenchKindOfName(const char* name)
+{
+    static const char* const names[] = {"dot", "line", "polyline", "rect", "circle", "triangle"};
+    for (int kind = 0; kind < 6; ++kind)
+        if (std::strcmp(name, names[kind]) == 0)
+            return kind;
+    return -1;
+}
+
+std::vector<BenchPrimitive> GeneratePrimitives(int count, int only)
 {
     Random random(20261206u);
     std::vector<BenchPrimitive> primitives;
@@ -63,6 +74,8 @@ std::vector<BenchPrimitive> GeneratePrimitives(int count)
         }
         BenchPrimitive p;
         p.kind = PickKind(random);
+        if (only >= 0)
+            p.kind = static_cast<BenchPrimitive::Kind>(only);
         p.colour = colour;
         p.fill = fill;
         const int x = random.Below(kBenchWidth);

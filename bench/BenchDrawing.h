@@ -30,8 +30,12 @@ struct BenchPrimitive {
 constexpr int kBenchWidth = 1920;
 constexpr int kBenchHeight = 1080;
 
-// A deterministic mix of `count` primitives in runs of one colour and fill.
-std::vector<BenchPrimitive> GeneratePrimitives(int count);
+// A deterministic mix of `count` primitives in runs of one colour and fill;
+// with `only` set, every primitive is of that kind (to see where time goes).
+std::vector<BenchPrimitive> GeneratePrimitives(int count, int only = -1);
+// The kind of a name ("dot", "line", "polyline", "rect", "circle",
+// "triangle"); -1 for any other.
+int BenchKindOfName(const char* name);
 
 // Adds the primitives to an empty drawing, with a frame that makes its world
 // bounds exactly the device window (so that the fitted scale is 1).

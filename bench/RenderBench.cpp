@@ -44,11 +44,18 @@ const int kLevelsPerDoubling = 5;
 struct Options {
     int primitives = kDefaultPrimitives;
     int runs = kDefaultRuns;
+    int only = -1; // one kind of primitive only
 };
 
 bool ParseOptions(int argc, char** argv, Options& options)
 {
     for (int i = 1; i < argc; ++i) {
+        if (std::strcmp(argv[i], "--only") == 0 && i + 1 < argc) {
+            options.only = BenchKindOfName(argv[++i]);
+            if (options.only < 0)
+                return false;
+            continue;
+        }
         const bool isPrimitives = std::strcmp(argv[i], "--primitives") == 0;
         const bool isRuns = std::strcmp(argv[i], "--runs") == 0;
         if ((!isPrimitives && !isRuns) || i + 1 >= argc)
@@ -218,13 +225,13 @@ int main(int argc, char** argv)
 {
     Options options;
     if (!ParseOptions(argc, argv, options)) {
-        std::fprintf(stderr, "usage: render_bench [--primitives N] [--runs R]\n");
+        std::fprintf(stderr, "usage: render_bench [--primitives N] [--runs R] [--only dot|line|polyline|rect|circle|triangle]\n");
         return 2;
     }
     Tavo_WiLibrary::Initialize();
 
     std::printf("render_bench: generating %d primitives ...\n", options.primitives);
-    const std::vector<BenchPrimitive> primitives = GeneratePrimitives(options.primitives);
+    const std::vector<BenchPrimitive> primitives = GeneratePrimitives(options.primitives, options.only);
     Tavo_GrDrawing drawing;
     BuildDrawing(primitives, drawing);
     Tavo_GrMapping mapping(&drawing, kLevelsPerDoubling);
