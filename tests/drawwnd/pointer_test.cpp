@@ -60,39 +60,6 @@ POINT ScreenPoint(HWND window, const CPoint& client)
     return point;
 }
 
-// Ends a rubber-rectangle loop that a fault keeps running (spinning on a
-// paint it does not carry out, or waiting after taking a quit): past the
-// deadline another thread releases every button, so the test fails instead
-// of hanging. A loop that behaves ends long before.
-class LoopDeadline {
-public:
-    LoopDeadline()
-    {
-        m_thread = std::thread([this] {
-            if (::WaitForSingleObject(m_stop, 5000) != WAIT_TIMEOUT)
-                return;
-            m_passed = true;
-            INPUT input = {};
-            input.type = INPUT_MOUSE;
-            input.mi.dwFlags = MOUSEEVENTF_LEFTUP | MOUSEEVENTF_RIGHTUP | MOUSEEVENTF_MIDDLEUP;
-            ::SendInput(1, &input, sizeof input);
-        });
-    }
-    ~LoopDeadline()
-    {
-        ::SetEvent(m_stop);
-        m_thread.join();
-        ::CloseHandle(m_stop);
-    }
-
-    bool Passed() const { return m_passed; }
-
-private:
-    HANDLE m_stop = ::CreateEventA(nullptr, TRUE, FALSE, nullptr);
-    std::atomic<bool> m_passed{false};
-    std::thread m_thread;
-};
-
 // A 500 x 400 scrollee without scroll bars and a drawing of 500 x 400 world
 // units, red on the left half, white on the right. Bound, the zero level
 // shows one unit per pixel: the client point (x, y) is the world point
@@ -154,7 +121,7 @@ protected:
     void FireHoldTimerIntoRubberRectangle()
     {
         wnd().dragAction = Tavo_WiDrawWnd::RubberRectangle;
-        LoopDeadline deadline;
+        const ScrollTest::ButtonReleaseDeadline deadline;
         FireHoldTimer();
         EXPECT_FALSE(deadline.Passed()) << "the loop had to be ended from outside";
     }

@@ -96,6 +96,26 @@ DWORD FreshTime()
     return now;
 }
 
+ButtonReleaseDeadline::ButtonReleaseDeadline(DWORD milliseconds) : m_stop(::CreateEventA(nullptr, TRUE, FALSE, nullptr))
+{
+    m_thread = std::thread([this, milliseconds] {
+        if (::WaitForSingleObject(m_stop, milliseconds) != WAIT_TIMEOUT)
+            return;
+        m_passed = true;
+        INPUT input = {};
+        input.type = INPUT_MOUSE;
+        input.mi.dwFlags = MOUSEEVENTF_LEFTUP | MOUSEEVENTF_RIGHTUP | MOUSEEVENTF_MIDDLEUP;
+        ::SendInput(1, &input, sizeof input);
+    });
+}
+
+ButtonReleaseDeadline::~ButtonReleaseDeadline()
+{
+    ::SetEvent(m_stop);
+    m_thread.join();
+    ::CloseHandle(m_stop);
+}
+
 TestWindow::TestWindow(const CRect& rect, HWND parent)
 {
     const DWORD style = parent != nullptr ? WS_CHILD | WS_VISIBLE : WS_POPUP | WS_VISIBLE | WS_CLIPCHILDREN;

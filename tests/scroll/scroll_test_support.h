@@ -8,9 +8,11 @@
 #include "Tavo_WiScrollWnd.h"
 
 #include <algorithm>
+#include <atomic>
 #include <functional>
 #include <ostream>
 #include <string>
+#include <thread>
 #include <tuple>
 #include <vector>
 
@@ -31,6 +33,24 @@ void SendKey(WORD virtualKey, DWORD time);
 // A base for explicit message times, at least two seconds after every base
 // handed out before, so that no two tests' clicks make a double click.
 DWORD FreshTime();
+
+// Ends a modal mouse loop (a rubber rectangle's) that a fault keeps running:
+// once the deadline passes, another thread releases every button, so the
+// test fails instead of hanging. A loop that behaves ends long before.
+class ButtonReleaseDeadline {
+public:
+    explicit ButtonReleaseDeadline(DWORD milliseconds = 5000);
+    ~ButtonReleaseDeadline();
+    ButtonReleaseDeadline(const ButtonReleaseDeadline&) = delete;
+    ButtonReleaseDeadline& operator=(const ButtonReleaseDeadline&) = delete;
+
+    bool Passed() const { return m_passed; }
+
+private:
+    HANDLE m_stop;
+    std::atomic<bool> m_passed{false};
+    std::thread m_thread;
+};
 
 // A plain window attached to a CWnd for the framework's calls: a shown and
 // activated top-level window at a screen rectangle when parent is null, a

@@ -60,35 +60,6 @@ constexpr Button Buttons[] = {
 };
 constexpr DWORD MoveOnly = 0;
 
-// Releases every button from another thread once the deadline passes.
-class LoopDeadline {
-public:
-    LoopDeadline()
-    {
-        m_thread = std::thread([this] {
-            if (::WaitForSingleObject(m_stop, RubberRectangleDeadlineMs) != WAIT_TIMEOUT)
-                return;
-            m_passed = true;
-            INPUT input = {};
-            input.type = INPUT_MOUSE;
-            input.mi.dwFlags = MOUSEEVENTF_LEFTUP | MOUSEEVENTF_RIGHTUP | MOUSEEVENTF_MIDDLEUP;
-            ::SendInput(1, &input, sizeof input);
-        });
-    }
-    ~LoopDeadline()
-    {
-        ::SetEvent(m_stop);
-        m_thread.join();
-        ::CloseHandle(m_stop);
-    }
-    bool Passed() const { return m_passed; }
-
-private:
-    HANDLE m_stop = ::CreateEventA(nullptr, TRUE, FALSE, nullptr);
-    std::atomic<bool> m_passed{false};
-    std::thread m_thread;
-};
-
 int Saturated(long long value)
 {
     return static_cast<int>(std::clamp<long long>(value, INT_MIN, INT_MAX));
@@ -565,7 +536,7 @@ void Engine::DoRubberRectangle(SoakHost& host)
     ScrollTest::SendMouse(button.up, to, m_time);
     if (m_ledger.HasTimer(host.Scrollee(), Tavo_WiScrollee::HoldTimerId)) {
         const int reported = wnd.counts.rubberRectangles;
-        LoopDeadline deadline;
+        const ScrollTest::ButtonReleaseDeadline deadline(RubberRectangleDeadlineMs);
         ::SendMessageA(host.Scrollee(), WM_TIMER, Tavo_WiScrollee::HoldTimerId, 0);
         if (deadline.Passed())
             m_stepFault = "the rubber rectangle's loop had to be ended from outside";
