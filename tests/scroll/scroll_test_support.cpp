@@ -60,7 +60,7 @@ void PumpInput()
     PumpUntil([] { return HIWORD(::GetQueueStatus(QS_INPUT)) == 0; });
 }
 
-void SendMouse(DWORD buttonFlags, POINT screenPoint, DWORD time)
+INPUT MouseInput(DWORD buttonFlags, POINT screenPoint, DWORD time, DWORD data)
 {
     const long long width = ::GetSystemMetrics(SM_CXSCREEN);
     const long long height = ::GetSystemMetrics(SM_CYSCREEN);
@@ -69,8 +69,15 @@ void SendMouse(DWORD buttonFlags, POINT screenPoint, DWORD time)
     // Absolute coordinates land exactly when rounded up.
     input.mi.dx = static_cast<LONG>((screenPoint.x * 65536LL + width - 1) / width);
     input.mi.dy = static_cast<LONG>((screenPoint.y * 65536LL + height - 1) / height);
+    input.mi.mouseData = data;
     input.mi.dwFlags = buttonFlags | MOUSEEVENTF_MOVE | MOUSEEVENTF_ABSOLUTE;
     input.mi.time = time;
+    return input;
+}
+
+void SendMouse(DWORD buttonFlags, POINT screenPoint, DWORD time)
+{
+    INPUT input = MouseInput(buttonFlags, screenPoint, time);
     ::SendInput(1, &input, sizeof input);
 }
 

@@ -26,6 +26,9 @@ bool PumpUntil(const std::function<bool()>& done);
 // Pumps until no input message is left in the queue.
 void PumpInput();
 
+// A mouse event at a screen point with exactly this message time (data: the
+// wheel's delta, for a wheel event), to send.
+INPUT MouseInput(DWORD buttonFlags, POINT screenPoint, DWORD time, DWORD data = 0);
 // A mouse event at a screen point, delivered with exactly this message time.
 void SendMouse(DWORD buttonFlags, POINT screenPoint, DWORD time);
 // A key press and release.

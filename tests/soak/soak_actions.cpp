@@ -433,10 +433,8 @@ void Engine::DoCentreAtCursor(SoakHost& host)
 
 void Engine::DoClick(SoakHost& host, bool twice)
 {
-    host.Activate();
-    Pump();
     POINT at;
-    if (!PointIn(host, at))
+    if (!ActivateAndPointIn(host, at))
         return;
     const Button& button = m_random.Pick(Buttons);
     Trace(" button %u at (%ld, %ld)", button.flag, at.x, at.y);
@@ -452,10 +450,8 @@ void Engine::DoClick(SoakHost& host, bool twice)
 void Engine::DoDrag(SoakHost& host, Tavo_WiDrawWnd::DragAction action, bool stealCapture)
 {
     SoakDrawWnd& wnd = host.Wnd();
-    host.Activate();
-    Pump();
     POINT at;
-    if (!PointIn(host, at))
+    if (!ActivateAndPointIn(host, at))
         return;
     static constexpr int directions[] = {-7, -1, 0, 1, 5};
     wnd.SetPanDirectionality(m_random.Pick(directions));
@@ -508,10 +504,8 @@ void Engine::DoDrag(SoakHost& host, Tavo_WiDrawWnd::DragAction action, bool stea
 void Engine::DoRubberRectangle(SoakHost& host)
 {
     SoakDrawWnd& wnd = host.Wnd();
-    host.Activate();
-    Pump();
     POINT at;
-    if (!PointIn(host, at))
+    if (!ActivateAndPointIn(host, at))
         return;
     const Button& button = m_random.Pick(Buttons);
     wnd.dragAction = Tavo_WiDrawWnd::RubberRectangle;
@@ -552,10 +546,8 @@ void Engine::DoRubberRectangle(SoakHost& host)
 void Engine::DoDataTip(SoakHost& host)
 {
     SoakDrawWnd& wnd = host.Wnd();
-    host.Activate();
-    Pump();
     POINT at;
-    if (!PointIn(host, at))
+    if (!ActivateAndPointIn(host, at))
         return;
     static const char* const texts[] = {"", "tip", "a data tip of a few words"};
     wnd.dataTipText = m_random.Chance(10) ? CString(std::string(2000, 'T').c_str()) : CString(m_random.Pick(texts));
@@ -775,6 +767,13 @@ bool Engine::PointIn(SoakHost& host, POINT& screen)
             return true;
     }
     return false;
+}
+
+bool Engine::ActivateAndPointIn(SoakHost& host, POINT& screen)
+{
+    host.Activate();
+    Pump();
+    return PointIn(host, screen);
 }
 
 POINT Engine::PointOnScreen()

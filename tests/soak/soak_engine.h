@@ -95,6 +95,8 @@ private:
     void DeliverDueTicks(SoakHost& host);
     // A screen point in the scrollee's client area; false when it has none.
     bool PointIn(SoakHost& host, POINT& screen);
+    // The window activated, then a point in it as PointIn gives one.
+    bool ActivateAndPointIn(SoakHost& host, POINT& screen);
     POINT PointOnScreen();
     CRect HostRect();
     Tavo_GrWRect WorldRect(SoakHost& host);

@@ -105,24 +105,9 @@ Tavo_GrWPoint ViewerFixture::WorldAt(const CPoint& client)
     return mapping->GetTransform().InvertPoint({client.x, mapping->GetDeviceWindowHeight() - client.y});
 }
 
-INPUT ViewerFixture::MouseInput(DWORD flags, POINT screen, DWORD time, DWORD data)
-{
-    const long long width = ::GetSystemMetrics(SM_CXSCREEN);
-    const long long height = ::GetSystemMetrics(SM_CYSCREEN);
-    INPUT input = {};
-    input.type = INPUT_MOUSE;
-    // Absolute coordinates land on the pixel exactly when rounded up.
-    input.mi.dx = static_cast<LONG>((screen.x * 65536LL + width - 1) / width);
-    input.mi.dy = static_cast<LONG>((screen.y * 65536LL + height - 1) / height);
-    input.mi.mouseData = data;
-    input.mi.dwFlags = flags | MOUSEEVENTF_MOVE | MOUSEEVENTF_ABSOLUTE;
-    input.mi.time = time;
-    return input;
-}
-
 void ViewerFixture::Mouse(DWORD flags, POINT screen, DWORD offset, DWORD data, bool handle)
 {
-    INPUT input = MouseInput(flags, screen, base + offset, data);
+    INPUT input = ScrollTest::MouseInput(flags, screen, base + offset, data);
     ::SendInput(1, &input, sizeof input);
     if (handle)
         ScrollTest::PumpInput();
@@ -180,7 +165,7 @@ void ViewerFixture::ShiftPress(POINT screen, DWORD offset)
     // The press and the Shift key go in one call, for the reason Key gives:
     // the press's key flags then carry MK_SHIFT.
     INPUT inputs[3] = {KeyInput(VK_SHIFT, 0), {}, KeyInput(VK_SHIFT, KEYEVENTF_KEYUP)};
-    inputs[1] = MouseInput(MOUSEEVENTF_LEFTDOWN, screen, base + offset, 0);
+    inputs[1] = ScrollTest::MouseInput(MOUSEEVENTF_LEFTDOWN, screen, base + offset);
     ::SendInput(3, inputs, sizeof(INPUT));
     ScrollTest::PumpInput();
 }

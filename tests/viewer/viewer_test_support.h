@@ -67,7 +67,6 @@ protected:
     void KeyUp(WORD virtualKey);
     // The left button pressed at a screen point with Shift held for the press.
     void ShiftPress(POINT screen, DWORD offset);
-    static INPUT MouseInput(DWORD flags, POINT screen, DWORD time, DWORD data);
     // The hold timer of the scrollee runs out: a held button becomes a drag.
     void FireHoldTimer();
     // The pointer has rested: the parked cursor monitor's timer runs out.
